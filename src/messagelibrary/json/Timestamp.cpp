@@ -1,0 +1,201 @@
+#include "messagelibrary/json/Timestamp.h"
+
+#include <boost/date_time/gregorian/gregorian_types.hpp>
+#include <cstring>
+#include <limits>
+
+namespace Korvane::Veldra::VeldraMessageLibrary {
+namespace {
+
+using boost::posix_time::ptime;
+
+constexpr int64_t kMicrosPerSecond = 1000000;
+constexpr int64_t kMicrosPerDay = 86400LL * kMicrosPerSecond;
+
+const ptime& UnixEpoch() {
+    static const ptime epoch(boost::gregorian::date(1970, 1, 1));
+    return epoch;
+}
+
+// Days since 1970-01-01 to a proleptic Gregorian date.
+void CivilFromDays(int64_t days, int64_t& year, unsigned& month, unsigned& day) {
+    days += 719468;
+    const int64_t era = (days >= 0 ? days : days - 146096) / 146097;
+    const unsigned doe = static_cast<unsigned>(days - era * 146097);
+    const unsigned yoe = (doe - doe / 1460 + doe / 36524 - doe / 146096) / 365;
+    const unsigned doy = doe - (365 * yoe + yoe / 4 - yoe / 100);
+    const unsigned mp = (5 * doy + 2) / 153;
+    day = doy - (153 * mp + 2) / 5 + 1;
+    month = mp < 10 ? mp + 3 : mp - 9;
+    year = static_cast<int64_t>(yoe) + era * 400 + (month <= 2 ? 1 : 0);
+}
+
+void AppendDigits(std::string& out, int64_t value, int width) {
+    char buffer[24];
+    int position = width;
+    buffer[position] = '\0';
+    while (position > 0) {
+        buffer[--position] = static_cast<char>('0' + value % 10);
+        value /= 10;
+    }
+    out.append(buffer, static_cast<std::size_t>(width));
+}
+
+// Parses a piece of decimal digits; an empty piece is 0.
+bool ParseDigits(const std::string& text, std::size_t from, std::size_t length, int64_t& value) {
+    value = 0;
+    if (from >= text.size()) return true;
+    const std::size_t end = std::min(text.size(), from + length);
+    for (std::size_t i = from; i < end; ++i) {
+        const char c = text[i];
+        if (c < '0' || c > '9') return false;
+        value = value * 10 + (c - '0');
+    }
+    return true;
+}
+
+bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
+    std::string stripped;
+    stripped.reserve(length);
+    for (std::size_t i = 0; i < length; ++i) {
+        const char c = text[i];
+        if (c != ':' && c != '-' && c != 'Z') stripped.push_back(c);
+    }
+    const auto t = stripped.find('T');
+    if (t == std::string::npos) return false;
+    const std::string datePart = stripped.substr(0, t);
+    const std::string timePart = stripped.substr(t + 1);
+    if (timePart.empty()) return false;
+
+    int64_t year = 0, month = 0, day = 0;
+    if (!ParseDigits(datePart, 0, 4, year) || !ParseDigits(datePart, 4, 2, month) ||
+        !ParseDigits(datePart, 6, 2, day)) {
+        return false;
+    }
+    if (year < 1400 || year > 9999 || month < 1 || month > 12 || day < 1) return false;
+    if (day > boost::gregorian::gregorian_calendar::end_of_month_day(
+                  static_cast<unsigned short>(year), static_cast<unsigned short>(month))) {
+        return false;
+    }
+
+    int64_t hours = 0, minutes = 0, seconds = 0, fraction = 0;
+    if (!ParseDigits(timePart, 0, 2, hours) || !ParseDigits(timePart, 2, 2, minutes) ||
+        !ParseDigits(timePart, 4, 2, seconds)) {
+        return false;
+    }
+    // The last piece: up to 7 characters, the first meant to be the ".".
+    if (timePart.size() > 7) {
+        const std::string digits = timePart.substr(7, 6);
+        if (!ParseDigits(digits, 0, digits.size(), fraction)) return false;
+        for (std::size_t n = digits.size(); n < 6; ++n) fraction *= 10;
+    }
+
+    try {
+        const boost::gregorian::date date(static_cast<unsigned short>(year),
+                                          static_cast<unsigned short>(month),
+                                          static_cast<unsigned short>(day));
+        const int64_t micros =
+            ((hours * 60 + minutes) * 60 + seconds) * kMicrosPerSecond + fraction;
+        result = ptime(date, boost::posix_time::microseconds(micros));
+    } catch (const std::exception&) {
+        return false;
+    }
+    return !result.is_special();
+}
+
+}  // namespace
+
+int64_t MicrosecondsSinceUnixEpoch(const Timestamp& timestamp) {
+    if (timestamp.is_not_a_date_time()) return kNotADateTimeTicks;
+    if (timestamp.is_pos_infinity()) return kPosInfinityTicks;
+    if (timestamp.is_neg_infinity()) return kNegInfinityTicks;
+    return (timestamp - UnixEpoch()).total_microseconds();
+}
+
+int64_t TimestampToTicks(const Timestamp& timestamp) {
+    if (timestamp.is_special()) return MicrosecondsSinceUnixEpoch(timestamp);
+    return MicrosecondsSinceUnixEpoch(timestamp) + kUnixEpochTicks;
+}
+
+Timestamp TimestampFromTicks(int64_t ticks) {
+    switch (ticks) {
+        case kNotADateTimeTicks:
+            return Timestamp(boost::posix_time::not_a_date_time);
+        case kPosInfinityTicks:
+            return Timestamp(boost::posix_time::pos_infin);
+        case kNegInfinityTicks:
+            return Timestamp(boost::posix_time::neg_infin);
+        default:
+            return UnixEpoch() + boost::posix_time::microseconds(ticks - kUnixEpochTicks);
+    }
+}
+
+Timestamp TimestampFromUnixSeconds(int64_t seconds) {
+    constexpr int64_t kLimit = (std::numeric_limits<int64_t>::max() - kUnixEpochTicks) /
+                               kMicrosPerSecond;
+    if (seconds > kLimit) return Timestamp(boost::posix_time::pos_infin);
+    const int64_t ticks = seconds * kMicrosPerSecond + kUnixEpochTicks;
+    return TimestampFromTicks(ticks);
+}
+
+void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
+    if (timestamp.is_not_a_date_time() || timestamp.is_neg_infinity()) {
+        out += "0001-01-01T00:00:00";
+        return;
+    }
+    if (timestamp.is_pos_infinity()) {
+        out += "9999-12-31T23:59:59.9999999";
+        return;
+    }
+    const int64_t micros = MicrosecondsSinceUnixEpoch(timestamp);
+    int64_t days = micros / kMicrosPerDay;
+    int64_t rest = micros % kMicrosPerDay;
+    if (rest < 0) {
+        rest += kMicrosPerDay;
+        --days;
+    }
+    int64_t year = 0;
+    unsigned month = 0, day = 0;
+    CivilFromDays(days, year, month, day);
+    const int64_t secondsOfDay = rest / kMicrosPerSecond;
+    const int64_t fraction = rest % kMicrosPerSecond;
+
+    AppendDigits(out, year, 4);
+    out.push_back('-');
+    AppendDigits(out, month, 2);
+    out.push_back('-');
+    AppendDigits(out, day, 2);
+    out.push_back('T');
+    AppendDigits(out, secondsOfDay / 3600, 2);
+    out.push_back(':');
+    AppendDigits(out, secondsOfDay / 60 % 60, 2);
+    out.push_back(':');
+    AppendDigits(out, secondsOfDay % 60, 2);
+    if (fraction != 0) {
+        out.push_back('.');
+        AppendDigits(out, fraction, 6);
+    }
+    out.push_back('Z');
+}
+
+std::string TimestampToText(const Timestamp& timestamp) {
+    std::string text;
+    text.reserve(28);
+    AppendTimestampText(timestamp, text);
+    return text;
+}
+
+bool ParseTimestamp(const std::string& text, Timestamp& result) {
+    if (text == "0001-01-01T00:00:00" || text == "0001-01-01T00:00:00Z") {
+        result = Timestamp(boost::posix_time::not_a_date_time);
+        return true;
+    }
+    return ParseStripped(text.data(), text.size(), result);
+}
+
+bool ParseTimestampZ(const char* text, Timestamp& result) {
+    if (text == nullptr) return false;
+    return ParseStripped(text, std::strlen(text), result);
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -1,0 +1,1 @@
+#include "kvveldra/TagWB.h"
