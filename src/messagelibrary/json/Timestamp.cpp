@@ -17,6 +17,11 @@ const ptime& UnixEpoch() {
     return epoch;
 }
 
+// The calendar's range: 1400-01-01T00:00:00 to 9999-12-31T23:59:59.999999,
+// in microseconds since 1970. Points outside it have no date text.
+constexpr int64_t kFirstMicros = -17987443200LL * kMicrosPerSecond;
+constexpr int64_t kLastMicros = 253402300800LL * kMicrosPerSecond - 1;
+
 // Days since 1970-01-01 to a proleptic Gregorian date.
 void CivilFromDays(int64_t days, int64_t& year, unsigned& month, unsigned& day) {
     days += 719468;
@@ -96,11 +101,16 @@ bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
                                           static_cast<unsigned short>(day));
         const int64_t micros =
             ((hours * 60 + minutes) * 60 + seconds) * kMicrosPerSecond + fraction;
-        result = ptime(date, boost::posix_time::microseconds(micros));
+        const ptime point(date, boost::posix_time::microseconds(micros));
+        // Hours that roll beyond the last day of 9999 leave the calendar.
+        if (point.is_special() || (point - UnixEpoch()).total_microseconds() > kLastMicros) {
+            return false;
+        }
+        result = point;
     } catch (const std::exception&) {
         return false;
     }
-    return !result.is_special();
+    return true;
 }
 
 }  // namespace
@@ -126,14 +136,19 @@ Timestamp TimestampFromTicks(int64_t ticks) {
         case kNegInfinityTicks:
             return Timestamp(boost::posix_time::neg_infin);
         default:
-            return UnixEpoch() + boost::posix_time::microseconds(ticks - kUnixEpochTicks);
+            break;
     }
+    // Counts before or beyond the calendar saturate to the infinities.
+    if (ticks < kFirstMicros + kUnixEpochTicks) return Timestamp(boost::posix_time::neg_infin);
+    if (ticks > kLastMicros + kUnixEpochTicks) return Timestamp(boost::posix_time::pos_infin);
+    return UnixEpoch() + boost::posix_time::microseconds(ticks - kUnixEpochTicks);
 }
 
 Timestamp TimestampFromUnixSeconds(int64_t seconds) {
     constexpr int64_t kLimit = (std::numeric_limits<int64_t>::max() - kUnixEpochTicks) /
                                kMicrosPerSecond;
     if (seconds > kLimit) return Timestamp(boost::posix_time::pos_infin);
+    if (seconds < kFirstMicros / kMicrosPerSecond) return Timestamp(boost::posix_time::neg_infin);
     const int64_t ticks = seconds * kMicrosPerSecond + kUnixEpochTicks;
     return TimestampFromTicks(ticks);
 }

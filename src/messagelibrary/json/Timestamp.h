@@ -17,6 +17,7 @@ constexpr int64_t kPosInfinityTicks = 0x7FFFFFFFFFFFFFFFLL;
 constexpr int64_t kNegInfinityTicks = static_cast<int64_t>(0x8000000000000000ULL);
 
 int64_t TimestampToTicks(const Timestamp& timestamp);
+// A count before 1400-01-01 gives -infinity, one beyond 9999-12-31 +infinity.
 Timestamp TimestampFromTicks(int64_t ticks);
 
 // Microseconds since 1970-01-01; the special values give their raw counts, as
@@ -24,7 +25,7 @@ Timestamp TimestampFromTicks(int64_t ticks);
 int64_t MicrosecondsSinceUnixEpoch(const Timestamp& timestamp);
 
 // The wall clock in seconds since 1970; a result that would land on a special
-// count keeps that special value.
+// count keeps that special value, one outside the calendar saturates.
 Timestamp TimestampFromUnixSeconds(int64_t seconds);
 
 // "YYYY-MM-DDThh:mm:ss[.ffffff]Z"; not-a-date-time and -infinity give
@@ -33,7 +34,8 @@ std::string TimestampToText(const Timestamp& timestamp);
 // Appends the same text to out, for writers that build a body in place.
 void AppendTimestampText(const Timestamp& timestamp, std::string& out);
 
-// Reads the text form. Returns false, leaving result unchanged, when refused.
+// Reads the text form. Returns false, leaving result unchanged, when refused;
+// a text whose hours roll beyond 9999-12-31 is refused too.
 bool ParseTimestamp(const std::string& text, Timestamp& result);
 // The same rules for a zero-terminated text, without the special-value
 // shortcut for "0001-01-01T00:00:00". Used for DATE_TIME tag values.

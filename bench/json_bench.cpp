@@ -1,0 +1,376 @@
+// Parsing and writing of realistic message bodies with the library's JSON code
+// and, on the same bytes, with RapidJSON (DOM parse, Writer).
+//
+// Bodies:
+//   query  - a query response of 10,000 tag records: path, type, a value
+//            record with its time, keywords, properties and aggregates.
+//   update - an update of 10,000 samples: path, one sample with time, type
+//            and value text.
+
+#include <benchmark/benchmark.h>
+
+#include <cstdio>
+#include <cstdlib>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "messagelibrary/json/JsonParser.h"
+#include "messagelibrary/json/JsonReaders.h"
+#include "messagelibrary/json/JsonVariant.h"
+#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/json/Timestamp.h"
+#include "rapidjson/document.h"
+#include "rapidjson/stringbuffer.h"
+#include "rapidjson/writer.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::Bench {
+
+// ---- The records, declared the way message families declare theirs ----------
+
+enum class DataType : int32_t { None = 0, Double = 1, Int = 2, String = 3, Boolean = 4 };
+constexpr JsonEnumText kDataTypeTexts[] = {
+    {0, "NONE"}, {1, "DOUBLE"}, {2, "INT"}, {3, "STRING"}, {4, "BOOLEAN"}};
+inline JsonEnumTexts JsonEnumTextsOf(DataType) {
+    return kDataTypeTexts;
+}
+
+struct Value {
+    Timestamp timestamp;
+    std::optional<DataType> type;
+    std::optional<std::string> value;
+};
+
+struct Aggregates {
+    int32_t count = 0;
+    double avg = 0.0;
+    std::optional<std::string> min;
+    std::optional<std::string> max;
+};
+
+struct Tag {
+    std::optional<std::string> path;
+    std::optional<DataType> type;
+    std::optional<Value> current;
+    std::optional<JsonStringList> keywords;
+    std::optional<JsonStringMap> properties;
+    std::optional<Aggregates> aggregates;
+};
+
+struct QueryResponse {
+    std::optional<std::vector<Tag>> tags;
+    int32_t totalCount = 0;
+};
+
+struct Sample {
+    std::optional<std::string> path;
+    std::optional<Value> value;
+};
+
+struct Update {
+    std::optional<std::vector<Sample>> updates;
+};
+
+void WriteJsonFields(JsonObjectWriter& out, const Value& v) {
+    out.Field("timestamp", v.timestamp).Field("type", v.type).Field("value", v.value);
+}
+bool ReadJsonFields(Value& v, const JsonVariant& o) {
+    return ReadField(v.timestamp, o, "timestamp") && ReadField(v.type, o, "type") &&
+           ReadField(v.value, o, "value");
+}
+void WriteJsonFields(JsonObjectWriter& out, const Aggregates& a) {
+    out.Field("count", a.count).Field("avg", a.avg).Field("min", a.min).Field("max", a.max);
+}
+bool ReadJsonFields(Aggregates& a, const JsonVariant& o) {
+    return ReadField(a.count, o, "count") && ReadField(a.avg, o, "avg") &&
+           ReadField(a.min, o, "min") && ReadField(a.max, o, "max");
+}
+void WriteJsonFields(JsonObjectWriter& out, const Tag& t) {
+    out.Field("path", t.path)
+        .Field("type", t.type)
+        .Field("current", t.current)
+        .Field("keywords", t.keywords)
+        .Field("properties", t.properties)
+        .Field("aggregates", t.aggregates);
+}
+bool ReadJsonFields(Tag& t, const JsonVariant& o) {
+    return ReadField(t.path, o, "path") && ReadField(t.type, o, "type") &&
+           ReadField(t.current, o, "current") && ReadField(t.keywords, o, "keywords") &&
+           ReadField(t.properties, o, "properties") && ReadField(t.aggregates, o, "aggregates");
+}
+void WriteJsonFields(JsonObjectWriter& out, const Sample& s) {
+    out.Field("path", s.path).Field("value", s.value);
+}
+bool ReadJsonFields(Sample& s, const JsonVariant& o) {
+    return ReadField(s.path, o, "path") && ReadField(s.value, o, "value");
+}
+
+// A message's Serialize() and parsing constructor.
+std::string Serialize(const QueryResponse& m) {
+    return JsonBodyWriter().Field("tags", m.tags).Field("totalCount", m.totalCount).Finish();
+}
+std::string Serialize(const Update& m) {
+    return JsonBodyWriter().Field("updates", m.updates).Finish();
+}
+void Deserialize(const std::string& body, QueryResponse& m) {
+    const JsonVariant json = ParseJsonBody(body, "QueryResponse");
+    JsonBodyReader(json).Field("tags", m.tags).Field("totalCount", m.totalCount);
+}
+void Deserialize(const std::string& body, Update& m) {
+    const JsonVariant json = ParseJsonBody(body, "Update");
+    JsonBodyReader(json).Field("updates", m.updates);
+}
+
+// ---- Test data -----------------------------------------------------------------
+
+constexpr int kRecords = 10000;
+
+Timestamp TimeOf(int i) {
+    return TimestampFromUnixSeconds(1456833600 + i) +
+           boost::posix_time::microseconds(i * 37 % 1000000);
+}
+
+std::string PathOf(int i) {
+    char path[64];
+    std::snprintf(path, sizeof(path), "Plant%d.Area%d.Line%d.Sensor%05d", i % 3, i % 17, i % 5, i);
+    return path;
+}
+
+QueryResponse MakeQuery() {
+    QueryResponse m;
+    m.tags.emplace();
+    m.tags->reserve(kRecords);
+    for (int i = 0; i < kRecords; ++i) {
+        Tag t;
+        t.path = PathOf(i);
+        t.type = DataType::Double;
+        t.current = Value{TimeOf(i), DataType::Double, std::to_string(i * 0.25)};
+        t.keywords = JsonStringList{"temperature", i % 2 ? "critical" : "normal", "line \"A\""};
+        t.properties =
+            JsonStringMap{{"units", "degC"}, {"location", "Hall 7/North"}, {"owner", "ops\tteam"}};
+        t.aggregates = Aggregates{i % 1000, i + 0.125, std::to_string(i), std::to_string(i + 10)};
+        m.tags->push_back(std::move(t));
+    }
+    m.totalCount = kRecords;
+    return m;
+}
+
+Update MakeUpdate() {
+    Update m;
+    m.updates.emplace();
+    m.updates->reserve(kRecords);
+    for (int i = 0; i < kRecords; ++i) {
+        m.updates->push_back(
+            Sample{PathOf(i), Value{TimeOf(i), DataType::Double, std::to_string(i * 1.5)}});
+    }
+    return m;
+}
+
+const QueryResponse& Query() {
+    static const QueryResponse query = MakeQuery();
+    return query;
+}
+const Update& Updates() {
+    static const Update update = MakeUpdate();
+    return update;
+}
+const std::string& QueryBody() {
+    static const std::string body = Serialize(Query());
+    return body;
+}
+const std::string& UpdateBody() {
+    static const std::string body = Serialize(Updates());
+    return body;
+}
+
+// ---- RapidJSON writers of the same records ---------------------------------------
+
+using RapidWriter = rapidjson::Writer<rapidjson::StringBuffer>;
+
+void RapidString(RapidWriter& w, const std::optional<std::string>& s) {
+    if (s) {
+        w.String(s->data(), static_cast<rapidjson::SizeType>(s->size()));
+    } else {
+        w.Null();
+    }
+}
+void RapidType(RapidWriter& w, const std::optional<DataType>& t) {
+    if (!t) {
+        w.Null();
+        return;
+    }
+    const char* text = JsonEnumTextsOf(*t).TextOf(static_cast<int32_t>(*t));
+    w.String(text ? text : "");
+}
+void RapidValue(RapidWriter& w, const Value& v) {
+    std::string time;
+    AppendTimestampText(v.timestamp, time);
+    w.StartObject();
+    w.Key("timestamp");
+    w.String(time.data(), static_cast<rapidjson::SizeType>(time.size()));
+    w.Key("type");
+    RapidType(w, v.type);
+    w.Key("value");
+    RapidString(w, v.value);
+    w.EndObject();
+}
+void RapidTag(RapidWriter& w, const Tag& t) {
+    w.StartObject();
+    w.Key("path");
+    RapidString(w, t.path);
+    w.Key("type");
+    RapidType(w, t.type);
+    w.Key("current");
+    RapidValue(w, *t.current);
+    w.Key("keywords");
+    w.StartArray();
+    for (const std::string& k : *t.keywords)
+        w.String(k.data(), static_cast<rapidjson::SizeType>(k.size()));
+    w.EndArray();
+    w.Key("properties");
+    w.StartObject();
+    for (const auto& [key, value] : *t.properties) {
+        w.Key(key.data(), static_cast<rapidjson::SizeType>(key.size()));
+        w.String(value.data(), static_cast<rapidjson::SizeType>(value.size()));
+    }
+    w.EndObject();
+    w.Key("aggregates");
+    w.StartObject();
+    w.Key("count");
+    w.Int(t.aggregates->count);
+    w.Key("avg");
+    w.Double(t.aggregates->avg);
+    w.Key("min");
+    RapidString(w, t.aggregates->min);
+    w.Key("max");
+    RapidString(w, t.aggregates->max);
+    w.EndObject();
+    w.EndObject();
+}
+std::string RapidSerialize(const QueryResponse& m) {
+    rapidjson::StringBuffer buffer;
+    RapidWriter w(buffer);
+    w.StartObject();
+    w.Key("tags");
+    w.StartArray();
+    for (const Tag& t : *m.tags) RapidTag(w, t);
+    w.EndArray();
+    w.Key("totalCount");
+    w.Int(m.totalCount);
+    w.EndObject();
+    return std::string(buffer.GetString(), buffer.GetSize());
+}
+std::string RapidSerialize(const Update& m) {
+    rapidjson::StringBuffer buffer;
+    RapidWriter w(buffer);
+    w.StartObject();
+    w.Key("updates");
+    w.StartArray();
+    for (const Sample& s : *m.updates) {
+        w.StartObject();
+        w.Key("path");
+        RapidString(w, s.path);
+        w.Key("value");
+        RapidValue(w, *s.value);
+        w.EndObject();
+    }
+    w.EndArray();
+    w.EndObject();
+    return std::string(buffer.GetString(), buffer.GetSize());
+}
+
+// Both writers must give the same bytes, or the comparison means nothing.
+void CheckSameBytes(benchmark::State& state, const std::string& ours, const std::string& theirs) {
+    if (ours != theirs) state.SkipWithError("the two writers disagree on the bytes");
+}
+
+// ---- Benchmarks ------------------------------------------------------------------
+
+template <const std::string& (*Body)()>
+void ParseTree(benchmark::State& state) {
+    const std::string& body = Body();
+    for (auto _ : state) {
+        JsonVariant json;
+        if (!Parse(json, body)) state.SkipWithError("parse failed");
+        benchmark::DoNotOptimize(json);
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * body.size()));
+}
+
+template <const std::string& (*Body)()>
+void RapidParseTree(benchmark::State& state) {
+    const std::string& body = Body();
+    for (auto _ : state) {
+        rapidjson::Document document;
+        document.Parse(body.c_str(), body.size());
+        if (document.HasParseError()) state.SkipWithError("parse failed");
+        benchmark::DoNotOptimize(document);
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * body.size()));
+}
+
+template <typename Message, const std::string& (*Body)()>
+void ParseMessage(benchmark::State& state) {
+    const std::string& body = Body();
+    for (auto _ : state) {
+        Message message;
+        Deserialize(body, message);
+        benchmark::DoNotOptimize(message);
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * body.size()));
+}
+
+template <typename Message, const Message& (*Data)()>
+void WriteMessage(benchmark::State& state) {
+    const Message& message = Data();
+    CheckSameBytes(state, Serialize(message), RapidSerialize(message));
+    std::size_t bytes = 0;
+    for (auto _ : state) {
+        const std::string body = Serialize(message);
+        bytes = body.size();
+        benchmark::DoNotOptimize(body.data());
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * bytes));
+}
+
+template <typename Message, const Message& (*Data)()>
+void RapidWriteMessage(benchmark::State& state) {
+    const Message& message = Data();
+    std::size_t bytes = 0;
+    for (auto _ : state) {
+        const std::string body = RapidSerialize(message);
+        bytes = body.size();
+        benchmark::DoNotOptimize(body.data());
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations() * bytes));
+}
+
+BENCHMARK(ParseTree<QueryBody>)->Name("Query/Parse/Library")->Unit(benchmark::kMillisecond);
+BENCHMARK(RapidParseTree<QueryBody>)->Name("Query/Parse/RapidJSON")->Unit(benchmark::kMillisecond);
+BENCHMARK(ParseMessage<QueryResponse, QueryBody>)
+    ->Name("Query/ParseAndRead/Library")
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(WriteMessage<QueryResponse, Query>)
+    ->Name("Query/Write/Library")
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(RapidWriteMessage<QueryResponse, Query>)
+    ->Name("Query/Write/RapidJSON")
+    ->Unit(benchmark::kMillisecond);
+
+BENCHMARK(ParseTree<UpdateBody>)->Name("Update/Parse/Library")->Unit(benchmark::kMillisecond);
+BENCHMARK(RapidParseTree<UpdateBody>)
+    ->Name("Update/Parse/RapidJSON")
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(ParseMessage<Update, UpdateBody>)
+    ->Name("Update/ParseAndRead/Library")
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(WriteMessage<Update, Updates>)
+    ->Name("Update/Write/Library")
+    ->Unit(benchmark::kMillisecond);
+BENCHMARK(RapidWriteMessage<Update, Updates>)
+    ->Name("Update/Write/RapidJSON")
+    ->Unit(benchmark::kMillisecond);
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::Bench
+
+BENCHMARK_MAIN();

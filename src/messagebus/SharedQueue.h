@@ -1,0 +1,88 @@
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <mutex>
+#include <string>
+#include <utility>
+
+#include "messagebus/EmptyTake.h"
+#include "messagebus/Semaphore.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// A first-in, first-out hand-off between threads: a deque and a semaphore with
+// one count per item, plus one per stored error and one for the close. A take
+// always sees the items before a stored error or the end of the stream. The
+// mutex is held only to push or pop, never while waiting.
+template <typename T>
+class SharedQueue {
+public:
+    // A negative bound means no bound.
+    explicit SharedQueue(int32_t bound = -1) : Bound(bound) {}
+    SharedQueue(const SharedQueue&) = delete;
+    SharedQueue& operator=(const SharedQueue&) = delete;
+
+    // Appends the item unless the queue holds Bound items or is closed; a
+    // dropped item is not reported.
+    void Add(T item) {
+        {
+            std::lock_guard<std::mutex> lock(Mutex);
+            if (Closed || Items.size() >= static_cast<uint32_t>(Bound)) return;
+            Items.push_back(std::move(item));
+        }
+        Available.Release();
+    }
+
+    // Waits up to timeoutMs (see Semaphore::Acquire) for a count. False, with
+    // out unchanged, when none came. With a count, moves the oldest item into
+    // out and returns true; with no item throws "End Of Stream." on a closed
+    // queue, else the stored error text as Veldra.QueueEmpty.
+    bool TryTake(T& out, uint32_t timeoutMs) {
+        if (!Available.Acquire(timeoutMs)) return false;
+        std::unique_lock<std::mutex> lock(Mutex);
+        if (!Items.empty()) {
+            out = std::move(Items.front());
+            Items.pop_front();
+            return true;
+        }
+        if (Closed) {
+            // The end of the stream is seen by every later take too.
+            Available.Release();
+        }
+        const bool closed = Closed;
+        const std::string errorText = ErrorText;
+        lock.unlock();
+        ThrowEmptyTake(closed, errorText);
+    }
+
+    // Stores the text and wakes one taker without adding an item.
+    void SetError(const std::string& text) {
+        {
+            std::lock_guard<std::mutex> lock(Mutex);
+            ErrorText = text;
+        }
+        Available.Release();
+    }
+
+    // Ends the stream: later items are dropped, and once the queued ones are
+    // taken every take throws "End Of Stream.".
+    void Close() {
+        {
+            std::lock_guard<std::mutex> lock(Mutex);
+            if (Closed) return;
+            Closed = true;
+        }
+        Available.Release();
+    }
+
+private:
+    std::mutex Mutex;
+    Semaphore Available;
+    std::deque<T> Items;
+    bool Closed = false;
+    int32_t Bound;
+    std::string ErrorText;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

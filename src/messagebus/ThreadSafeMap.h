@@ -1,0 +1,89 @@
+#pragma once
+
+#include <cstddef>
+#include <map>
+#include <mutex>
+#include <utility>
+#include <vector>
+
+namespace Korvane::Veldra::MessageBus {
+
+// An ordered map behind a mutex. Every operation holds the mutex for that call
+// alone; the compound steps the bus needs (take, conditional erase) are
+// operations of their own so that no caller has to hold the lock itself. The
+// mutex is never held across a call into another component: predicates given
+// to EraseIf must not call out.
+template <typename K, typename V>
+class ThreadSafeMap {
+public:
+    ThreadSafeMap() = default;
+    ThreadSafeMap(const ThreadSafeMap&) = delete;
+    ThreadSafeMap& operator=(const ThreadSafeMap&) = delete;
+
+    // False, and nothing changed, when the key exists.
+    bool Insert(const K& key, V value) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        return map_.emplace(key, std::move(value)).second;
+    }
+
+    // Inserts or replaces; true when the key was new.
+    bool InsertOrAssign(const K& key, V value) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        return map_.insert_or_assign(key, std::move(value)).second;
+    }
+
+    bool TryGet(const K& key, V& out) const {
+        std::lock_guard<std::mutex> lock(mutex_);
+        const auto found = map_.find(key);
+        if (found == map_.end()) return false;
+        out = found->second;
+        return true;
+    }
+
+    // Look-up and erase in one step: moves the value out and removes the entry.
+    bool TryTake(const K& key, V& out) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        const auto found = map_.find(key);
+        if (found == map_.end()) return false;
+        out = std::move(found->second);
+        map_.erase(found);
+        return true;
+    }
+
+    bool Erase(const K& key) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        return map_.erase(key) != 0;
+    }
+
+    // Erases the entry when it exists and shouldErase(value) is true.
+    template <typename Predicate>
+    bool EraseIf(const K& key, Predicate shouldErase) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        const auto found = map_.find(key);
+        if (found == map_.end() || !shouldErase(static_cast<const V&>(found->second))) {
+            return false;
+        }
+        map_.erase(found);
+        return true;
+    }
+
+    // All keys in key order.
+    std::vector<K> Keys() const {
+        std::lock_guard<std::mutex> lock(mutex_);
+        std::vector<K> keys;
+        keys.reserve(map_.size());
+        for (const auto& entry : map_) keys.push_back(entry.first);
+        return keys;
+    }
+
+    std::size_t Size() const {
+        std::lock_guard<std::mutex> lock(mutex_);
+        return map_.size();
+    }
+
+private:
+    mutable std::mutex mutex_;
+    std::map<K, V> map_;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,74 @@
+#include "messagelibrary/AmqpPropertyMapping.h"
+
+#include <ctime>
+
+#include "messagelibrary/HeaderKeys.h"
+
+namespace Korvane::Veldra::MessageBus {
+namespace {
+
+constexpr uint8_t kPersistentDeliveryMode = 2;
+
+bool HasFlag(const AmqpProperties& properties, uint32_t flag) {
+    return (properties.flags & flag) != 0;
+}
+
+// The text of a flagged property, or empty when its flag is clear.
+const std::string& FlaggedText(const AmqpProperties& properties, uint32_t flag,
+                               const std::string& text) {
+    static const std::string kEmpty;
+    return HasFlag(properties, flag) ? text : kEmpty;
+}
+
+}  // namespace
+
+AmqpProperties ToAmqpProperties(const MessageHeaders& headers, int64_t nowUnixSeconds) {
+    using namespace AmqpPropertyFlags;
+    AmqpProperties properties;
+    properties.flags = kContentType | kTimestamp | kType | kCorrelationId | kHeaders;
+    properties.contentType = headers.contentType;
+    properties.timestamp = static_cast<uint64_t>(nowUnixSeconds);
+    properties.type = headers.messageType;
+    properties.correlationId = headers.correlationId;
+    properties.headers.reserve(headers.headers.size());
+    for (const auto& [key, value] : headers.headers) {
+        properties.headers.push_back(AmqpHeaderEntry{key, kAmqpLongStringKind, value});
+    }
+    if (headers.GetHeader(HeaderKeys::kPersistent) != nullptr) {
+        properties.flags |= kDeliveryMode;
+        properties.deliveryMode = kPersistentDeliveryMode;
+    }
+    return properties;
+}
+
+AmqpProperties ToAmqpProperties(const MessageHeaders& headers) {
+    return ToAmqpProperties(headers, static_cast<int64_t>(std::time(nullptr)));
+}
+
+MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::string& routingKey,
+                               const std::string& consumerTag, uint64_t deliveryTag) {
+    using namespace AmqpPropertyFlags;
+    MessageHeaders headers;
+    headers.messageType = FlaggedText(properties, kType, properties.type);
+    headers.contentType = FlaggedText(properties, kContentType, properties.contentType);
+    headers.routingKey = routingKey;
+    if (HasFlag(properties, kTimestamp)) {
+        const auto seconds = static_cast<int32_t>(properties.timestamp / 1000u);
+        headers.timestamp = VeldraMessageLibrary::TimestampFromUnixSeconds(seconds);
+    }
+    const std::string& correlationId =
+        FlaggedText(properties, kCorrelationId, properties.correlationId);
+    headers.correlationId = correlationId.substr(0, correlationId.find('\0'));
+
+    const bool persistent =
+        properties.flags != 0 && properties.deliveryMode == kPersistentDeliveryMode;
+    headers.SetHeader(HeaderKeys::kPersistent, std::string(persistent ? "true" : "false"));
+    headers.SetHeader(HeaderKeys::kConsumerTag, consumerTag);
+    if (HasFlag(properties, kHeaders)) {
+        for (const auto& entry : properties.headers) headers.SetHeader(entry.key, entry.value);
+    }
+    headers.SetDeliveryTag(deliveryTag);
+    return headers;
+}
+
+}  // namespace Korvane::Veldra::MessageBus

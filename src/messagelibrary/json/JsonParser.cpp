@@ -1,0 +1,122 @@
+#include "messagelibrary/json/JsonParser.h"
+
+#include <cstring>
+#include <deque>
+#include <utility>
+#include <vector>
+
+#include "messagelibrary/json/JsonGrammar.h"
+#include "messagelibrary/json/JsonNumberText.h"
+#include "messagelibrary/json/JsonUnescape.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary {
+namespace {
+
+using Jsonz::JsonError;
+using Jsonz::JsonToken;
+
+// Builds the tree in the same pass as the grammar checks the text. Finished
+// values wait on a stack until their container closes; the container then
+// takes them over in one go, sized exactly.
+class TreeBuilder {
+public:
+    TreeBuilder() {
+        values_.reserve(64);
+        keys_.reserve(32);
+        frames_.reserve(16);
+    }
+
+    void Null() { values_.emplace_back(JsonKind::Null); }
+    void Bool(bool value) { values_.emplace_back(value); }
+    void Number(const JsonToken& token) {
+        double value = 0.0;
+        // A number text the grammar lets through but that has no value ("-",
+        // "1e+") fails the whole parse.
+        if (!Jsonz::ConvertJsonDouble(token.start, token.length, value)) failed_ = true;
+        values_.emplace_back(value);
+    }
+    void String(const JsonToken& token) { values_.emplace_back(Decode(token)); }
+    // A key without escapes is kept as a view of the document; a decoded one
+    // gets storage that stays put until the parse ends.
+    void Key(const JsonToken& token) {
+        if (!token.hasEscape) {
+            keys_.emplace_back(token.start, token.length);
+            return;
+        }
+        keys_.push_back(decodedKeys_.emplace_back(Decode(token)));
+    }
+    void BeginObject() { frames_.push_back({values_.size(), keys_.size()}); }
+    void BeginArray() { frames_.push_back({values_.size(), keys_.size()}); }
+
+    void EndObject() {
+        const Frame frame = frames_.back();
+        frames_.pop_back();
+        JsonObjectBuilder object;
+        object.Reserve(values_.size() - frame.firstValue);
+        for (std::size_t i = frame.firstValue, k = frame.firstKey; i < values_.size(); ++i, ++k) {
+            object.Add(keys_[k], std::move(values_[i]));
+        }
+        keys_.resize(frame.firstKey);
+        values_.resize(frame.firstValue);
+        object.Finish(values_.emplace_back());
+    }
+
+    void EndArray() {
+        const Frame frame = frames_.back();
+        frames_.pop_back();
+        JsonVariant array(JsonKind::Array);
+        array.Reserve(values_.size() - frame.firstValue);
+        for (std::size_t i = frame.firstValue; i < values_.size(); ++i) {
+            array.Append(std::move(values_[i]));
+        }
+        values_.resize(frame.firstValue);
+        values_.push_back(std::move(array));
+    }
+
+    bool Failed() const noexcept { return failed_; }
+    JsonVariant TakeRoot() { return std::move(values_.back()); }
+
+private:
+    struct Frame {
+        std::size_t firstValue;
+        std::size_t firstKey;
+    };
+
+    // The text of a string token: as it stands when it has no backslash,
+    // else decoded (an escape sequence that fails gives "").
+    std::string_view Decode(const JsonToken& token) {
+        if (!token.hasEscape) {
+            return {token.start, token.length};
+        }
+        scratch_.resize(token.length);
+        std::size_t count = 0;
+        Jsonz::UnescapeJsonString(token.start, token.length, scratch_.data(), count);
+        return {scratch_.data(), count};
+    }
+
+    std::vector<JsonVariant> values_;
+    std::vector<std::string_view> keys_;
+    std::deque<std::string> decodedKeys_;
+    std::vector<Frame> frames_;
+    std::string scratch_;
+    bool failed_ = false;
+};
+
+}  // namespace
+
+bool Parse(JsonVariant& variant, const char* text) {
+    TreeBuilder builder;
+    JsonError error;
+    if (!Jsonz::ScanDocument(text, builder, error) || builder.Failed()) {
+        variant.Reset();
+        return false;
+    }
+    variant = builder.TakeRoot();
+    return true;
+}
+
+bool Parse(JsonVariant& variant, const std::string& text) {
+    return Parse(variant, text.c_str());
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary
