@@ -2,6 +2,8 @@
 
 #include <cstdint>
 
+#include "messagelibrary/json/JsonEnum.h"
+
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
 // The data type of a tag as the tag services and their messages number it.
@@ -14,5 +16,13 @@ enum class TagDataType : int32_t {
     UInt64 = 5,
     DateTime = 6,
 };
+
+inline constexpr JsonEnumText kTagDataTypeTexts[] = {
+    {0, "NONE"},    {1, "DOUBLE"},  {2, "INT"},       {3, "STRING"},
+    {4, "BOOLEAN"}, {5, "U_INT64"}, {6, "DATE_TIME"},
+};
+inline JsonEnumTexts JsonEnumTextsOf(TagDataType) {
+    return kTagDataTypeTexts;
+}
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <string>
+
+namespace Korvane::Veldra::VeldraMessageLibrary {
+
+// The tag services, the targets of the tag requests and routed messages.
+inline const std::string kTagIngestionService = "TagIngestion";
+inline const std::string kTagCurrentValueService = "TagCurrentValue";
+inline const std::string kTagInfoService = "TagInfo";
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -1,0 +1,38 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagebus/interfaces/IRoutingSource.h"
+#include "messagelibrary/ErrorRecord.h"
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/ResponseMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
+
+// The outcome of a create-or-update; the errors of single tags are nested in
+// one error record.
+class TagInfoCreateOrUpdateTagsResponse : public MessageBus::ResponseMessage {
+public:
+    inline static const std::string kMessageName = "TagInfoCreateOrUpdateTagsResponse";
+
+    TagInfoCreateOrUpdateTagsResponse(const MessageBus::Interfaces::IRoutingSource& request,
+                                      std::optional<ErrorRecord> errors);
+    // An error response: the fields stay unset.
+    TagInfoCreateOrUpdateTagsResponse(const MessageBus::Interfaces::IRoutingSource& request,
+                                      const MessageBus::MessageError& error);
+    // Parses a received body.
+    TagInfoCreateOrUpdateTagsResponse(MessageBus::MessageHeaders headers,
+                                      const MessageBus::MessageBody& body);
+
+    const std::optional<ErrorRecord>& Errors() const { return errors_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    std::optional<ErrorRecord> errors_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

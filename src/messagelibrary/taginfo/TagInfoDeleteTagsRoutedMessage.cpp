@@ -1,0 +1,27 @@
+#include "messagelibrary/taginfo/TagInfoDeleteTagsRoutedMessage.h"
+
+#include <utility>
+
+#include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/TagServices.h"
+#include "messagelibrary/json/JsonReaders.h"
+#include "messagelibrary/json/JsonWriters.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
+
+TagInfoDeleteTagsRoutedMessage::TagInfoDeleteTagsRoutedMessage(std::optional<JsonStringList> paths)
+    : MessageBus::RoutedMessage(kMessageName, MessageBus::kJsonContentType, kTagInfoService),
+      paths_(std::move(paths)) {}
+
+TagInfoDeleteTagsRoutedMessage::TagInfoDeleteTagsRoutedMessage(MessageBus::MessageHeaders headers,
+                                                               const MessageBus::MessageBody& body)
+    : MessageBus::RoutedMessage(std::move(headers)) {
+    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
+    JsonBodyReader(json).Field("paths", paths_);
+}
+
+MessageBus::MessageBody TagInfoDeleteTagsRoutedMessage::Serialize() const {
+    return MessageBus::MessageBody(JsonBodyWriter().Field("paths", paths_).Finish());
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

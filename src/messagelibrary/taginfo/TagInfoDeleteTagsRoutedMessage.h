@@ -1,0 +1,31 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RoutedMessage.h"
+#include "messagelibrary/json/JsonReaders.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
+
+// Deletes tags by path.
+class TagInfoDeleteTagsRoutedMessage : public MessageBus::RoutedMessage {
+public:
+    inline static const std::string kMessageName = "TagInfoDeleteTagsRoutedMessage";
+
+    explicit TagInfoDeleteTagsRoutedMessage(std::optional<JsonStringList> paths);
+    // Parses a received body.
+    TagInfoDeleteTagsRoutedMessage(MessageBus::MessageHeaders headers,
+                                   const MessageBus::MessageBody& body);
+
+    const std::optional<JsonStringList>& Paths() const { return paths_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    std::optional<JsonStringList> paths_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

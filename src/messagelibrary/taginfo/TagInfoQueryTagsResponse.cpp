@@ -1,0 +1,39 @@
+#include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
+
+#include <optional>
+#include <utility>
+
+#include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/json/JsonReaders.h"
+#include "messagelibrary/json/JsonWriters.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
+
+TagInfoQueryTagsResponse::TagInfoQueryTagsResponse(
+    const MessageBus::Interfaces::IRoutingSource& request,
+    std::optional<std::vector<TagRecord>> tags, int32_t totalCount)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()),
+      tags_(std::move(tags)),
+      totalCount_(totalCount) {
+    AnswerTo(request, std::nullopt);
+}
+
+TagInfoQueryTagsResponse::TagInfoQueryTagsResponse(
+    const MessageBus::Interfaces::IRoutingSource& request, const MessageBus::MessageError& error)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()) {
+    AnswerTo(request, error);
+}
+
+TagInfoQueryTagsResponse::TagInfoQueryTagsResponse(MessageBus::MessageHeaders headers,
+                                                   const MessageBus::MessageBody& body)
+    : MessageBus::ResponseMessage(std::move(headers)) {
+    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
+    JsonBodyReader(json).Field("tags", tags_).Field("totalCount", totalCount_);
+}
+
+MessageBus::MessageBody TagInfoQueryTagsResponse::Serialize() const {
+    return MessageBus::MessageBody(
+        JsonBodyWriter().Field("tags", tags_).Field("totalCount", totalCount_).Finish());
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

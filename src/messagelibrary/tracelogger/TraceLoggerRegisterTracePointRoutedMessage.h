@@ -1,0 +1,30 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RoutedMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
+
+// Makes a trace point known to the service, by its full name.
+class TraceLoggerRegisterTracePointRoutedMessage : public MessageBus::RoutedMessage {
+public:
+    inline static const std::string kMessageName = "TraceLoggerRegisterTracePointRoutedMessage";
+
+    explicit TraceLoggerRegisterTracePointRoutedMessage(std::optional<std::string> tracePointName);
+    // Parses a received body.
+    TraceLoggerRegisterTracePointRoutedMessage(MessageBus::MessageHeaders headers,
+                                               const MessageBus::MessageBody& body);
+
+    const std::optional<std::string>& TracePointName() const { return tracePointName_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    std::optional<std::string> tracePointName_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
+
+// Asks for the settings of the trace points.
+class TraceLoggerTracePointListRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "TraceLoggerTracePointListRequest";
+
+    TraceLoggerTracePointListRequest();
+    // Parses a received body.
+    TraceLoggerTracePointListRequest(MessageBus::MessageHeaders headers,
+                                     const MessageBus::MessageBody& body);
+
+    MessageBus::MessageBody Serialize() const override;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -1,0 +1,45 @@
+#include "utilities/Paths.h"
+
+#include <cstdlib>
+#include <filesystem>
+
+#include "errors/VeldraException.h"
+
+namespace Korvane::Veldra::VeldraUtilities {
+namespace {
+
+std::string ReadDataDirectory() {
+    const char* overridden = std::getenv("VELDRA_DATA_DIR");
+    if (overridden != nullptr && *overridden != '\0') return overridden;
+    return "/etc/korvane/kvveldra";
+}
+
+}  // namespace
+
+const std::string& GetDataDirectory() {
+    static const std::string root = ReadDataDirectory();
+    return root;
+}
+
+std::string GetConfigDirectory() {
+    return (std::filesystem::path(GetDataDirectory()) / "Config").string();
+}
+
+std::string GetLogDirectory() {
+    return (std::filesystem::path(GetDataDirectory()) / "Logs").string();
+}
+
+const std::string& GetApplicationDirectory() {
+    static const std::string directory;
+    if (directory.empty()) {
+        throw new MessageBus::VeldraException(-251004,
+                                              "Could not determine Application Directory");
+    }
+    return directory;
+}
+
+std::string GetDefaultProductName() { return "KV Fenmark"; }
+
+void GetDefaultProductName(std::string& name) { name = GetDefaultProductName(); }
+
+}  // namespace Korvane::Veldra::VeldraUtilities

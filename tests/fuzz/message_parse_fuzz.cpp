@@ -1,0 +1,107 @@
+// The parsing constructors of the tag and trace logger messages. The first
+// byte picks the class, the rest is the body. A body either parses or is
+// refused with VeldraException (or the conversion failure of a numeric text);
+// what parses is written, and when that text parses again it must be written
+// with the same bytes.
+
+#include <boost/lexical_cast.hpp>
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <utility>
+
+#include "errors/VeldraException.h"
+#include "messagelibrary/tagcurrentvalue/TagCvAggregatesResetBroadcast.h"
+#include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
+#include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
+#include "messagelibrary/tagcurrentvalue/TagCvResetAggregatesRoutedMessage.h"
+#include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsRequest.h"
+#include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsResponse.h"
+#include "messagelibrary/taginfo/TagInfoCreateTagRoutedMessage.h"
+#include "messagelibrary/taginfo/TagInfoDeleteTagsRoutedMessage.h"
+#include "messagelibrary/taginfo/TagInfoDeletedTagsBroadcast.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsRequest.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
+#include "messagelibrary/taginfo/TagInfoTagMetadataUpdatedBroadcast.h"
+#include "messagelibrary/taginfo/TagInfoUpdateTagRoutedMessage.h"
+#include "messagelibrary/tagingestion/TagNewJournalsWrittenBroadcast.h"
+#include "messagelibrary/tagingestion/TagNewTagsIngestedBroadcast.h"
+#include "messagelibrary/tagingestion/TagUpdateValuesRoutedMessage.h"
+#include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
+#include "messagelibrary/tracelogger/TraceLoggerCommandRequest.h"
+#include "messagelibrary/tracelogger/TraceLoggerCommandResponse.h"
+#include "messagelibrary/tracelogger/TraceLoggerRegisterTracePointRoutedMessage.h"
+#include "messagelibrary/tracelogger/TraceLoggerSnapshotBroadcast.h"
+#include "messagelibrary/tracelogger/TraceLoggerStoreEntriesRoutedMessage.h"
+#include "messagelibrary/tracelogger/TraceLoggerTracePointListRequest.h"
+#include "messagelibrary/tracelogger/TraceLoggerTracePointListResponse.h"
+
+namespace {
+
+using namespace Korvane::Veldra::VeldraMessageLibrary;
+using namespace Korvane::Veldra::MessageBus;
+
+using Parser = std::unique_ptr<MessageBase> (*)(const MessageBody&);
+
+template <typename M>
+std::unique_ptr<MessageBase> ParseAs(const MessageBody& body) {
+    MessageHeaders headers;
+    headers.messageType = M::kMessageName;
+    return std::make_unique<M>(std::move(headers), body);
+}
+
+// Indexed by the first byte, modulo the count; the seed corpus depends on
+// this order.
+constexpr Parser kParsers[] = {
+    ParseAs<TagIngestionMessages::TagNewJournalsWrittenBroadcast>,
+    ParseAs<TagIngestionMessages::TagNewTagsIngestedBroadcast>,
+    ParseAs<TagIngestionMessages::TagUpdateValuesRoutedMessage>,
+    ParseAs<TagCurrentValueMessages::TagCvAggregatesResetBroadcast>,
+    ParseAs<TagCurrentValueMessages::TagCvQueryCurrentValuesByPathRequest>,
+    ParseAs<TagCurrentValueMessages::TagCvQueryCurrentValuesByPathResponse>,
+    ParseAs<TagCurrentValueMessages::TagCvResetAggregatesRoutedMessage>,
+    ParseAs<TagInfoMessages::TagInfoCreateOrUpdateTagsRequest>,
+    ParseAs<TagInfoMessages::TagInfoCreateOrUpdateTagsResponse>,
+    ParseAs<TagInfoMessages::TagInfoCreateTagRoutedMessage>,
+    ParseAs<TagInfoMessages::TagInfoDeleteTagsRoutedMessage>,
+    ParseAs<TagInfoMessages::TagInfoDeletedTagsBroadcast>,
+    ParseAs<TagInfoMessages::TagInfoQueryTagsRequest>,
+    ParseAs<TagInfoMessages::TagInfoQueryTagsResponse>,
+    ParseAs<TagInfoMessages::TagInfoTagMetadataUpdatedBroadcast>,
+    ParseAs<TagInfoMessages::TagInfoUpdateTagRoutedMessage>,
+    ParseAs<TraceLoggerMessages::TraceLoggerBroadcastTracePointsRoutedMessage>,
+    ParseAs<TraceLoggerMessages::TraceLoggerCommandRequest>,
+    ParseAs<TraceLoggerMessages::TraceLoggerCommandResponse>,
+    ParseAs<TraceLoggerMessages::TraceLoggerRegisterTracePointRoutedMessage>,
+    ParseAs<TraceLoggerMessages::TraceLoggerSnapshotBroadcast>,
+    ParseAs<TraceLoggerMessages::TraceLoggerStoreEntriesRoutedMessage>,
+    ParseAs<TraceLoggerMessages::TraceLoggerTracePointListRequest>,
+    ParseAs<TraceLoggerMessages::TraceLoggerTracePointListResponse>,
+};
+constexpr std::size_t kParserCount = sizeof(kParsers) / sizeof(kParsers[0]);
+
+// The body written by the parsed message, or nothing when it is refused.
+bool ParseAndWrite(Parser parse, const MessageBody& body, std::string& written) {
+    try {
+        written = parse(body)->Serialize().ToString();
+        return true;
+    } catch (const VeldraException&) {
+    } catch (const boost::bad_lexical_cast&) {
+    }
+    return false;
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, std::size_t size) {
+    if (size == 0) return 0;
+    const Parser parse = kParsers[data[0] % kParserCount];
+    const MessageBody body(reinterpret_cast<const char*>(data + 1), size - 1);
+
+    std::string first;
+    if (!ParseAndWrite(parse, body, first)) return 0;
+    std::string second;
+    if (ParseAndWrite(parse, MessageBody(first), second) && second != first) __builtin_trap();
+    return 0;
+}
