@@ -1,0 +1,47 @@
+#include "messagebus/AmqpChannel.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Korvane::Veldra::MessageBus {
+
+void EnvelopeDeleter::operator()(amqp_envelope_t* envelope) const {
+    if (envelope == nullptr) return;
+    amqp_destroy_envelope(envelope);
+    delete envelope;
+}
+
+EnvelopePtr MakeEnvelope() {
+    return EnvelopePtr(new amqp_envelope_t{}, EnvelopeDeleter());
+}
+
+AmqpChannel::AmqpChannel(uint16_t id, std::shared_ptr<EnvelopeQueue> envelopes)
+    : Id(id), Envelopes(std::move(envelopes)), ReturnEvents(std::make_shared<ReturnEventQueue>()) {}
+
+bool AmqpChannel::AddBinding(const std::string& queueName, const std::vector<std::string>& keys) {
+    std::lock_guard<std::recursive_mutex> lock(BindingMutex);
+    AmqpBinding binding{queueName, keys};
+    if (std::find(Bindings.begin(), Bindings.end(), binding) != Bindings.end()) return false;
+    Bindings.push_back(std::move(binding));
+    return true;
+}
+
+bool AmqpChannel::RemoveBinding(const std::string& queueName,
+                                const std::vector<std::string>& keys) {
+    std::lock_guard<std::recursive_mutex> lock(BindingMutex);
+    const auto found = std::find(Bindings.begin(), Bindings.end(), AmqpBinding{queueName, keys});
+    if (found == Bindings.end()) return false;
+    Bindings.erase(found);
+    return true;
+}
+
+std::vector<AmqpBinding> AmqpChannel::GetBindings() const {
+    std::lock_guard<std::recursive_mutex> lock(BindingMutex);
+    return Bindings;
+}
+
+bool AmqpChannel::TryTakeReturnEvent(ResetEvent& out) {
+    return ReturnEvents->TryTake(out, 0);
+}
+
+}  // namespace Korvane::Veldra::MessageBus

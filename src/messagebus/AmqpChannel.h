@@ -1,0 +1,80 @@
+#pragma once
+
+#include <amqp.h>
+
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "messagebus/ResetEvent.h"
+#include "messagebus/Semaphore.h"
+#include "messagebus/SharedQueue.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// Releases what rabbitmq-c put in an envelope, then the envelope itself.
+struct EnvelopeDeleter {
+    void operator()(amqp_envelope_t* envelope) const;
+};
+
+using EnvelopePtr = std::shared_ptr<amqp_envelope_t>;
+using EnvelopeQueue = SharedQueue<EnvelopePtr>;
+using ReturnEventQueue = SharedQueue<ResetEvent>;
+
+// A zeroed envelope owned through EnvelopeDeleter, ready for
+// amqp_consume_message.
+EnvelopePtr MakeEnvelope();
+
+// The lowest channel number from 1 upward, below 65535, that the table (a map
+// keyed by channel number) does not hold; 0 when every one is taken.
+template <typename ChannelTable>
+uint16_t LowestFreeChannelId(const ChannelTable& channels) {
+    for (uint32_t id = 1; id < 65535; ++id) {
+        if (channels.find(static_cast<uint16_t>(id)) == channels.end()) {
+            return static_cast<uint16_t>(id);
+        }
+    }
+    return 0;
+}
+
+// One queue binding made on a channel: the queue and the elements of its key.
+struct AmqpBinding {
+    std::string QueueName;
+    std::vector<std::string> Keys;
+
+    bool operator==(const AmqpBinding& other) const {
+        return QueueName == other.QueueName && Keys == other.Keys;
+    }
+};
+
+// The record of one opened AMQP channel: its number, the queue the reader
+// thread fills with its deliveries, the notices of returned messages, the
+// signal to declare and bind anew, and what has been bound on it.
+class AmqpChannel {
+public:
+    AmqpChannel(uint16_t id, std::shared_ptr<EnvelopeQueue> envelopes);
+    AmqpChannel(const AmqpChannel&) = delete;
+    AmqpChannel& operator=(const AmqpChannel&) = delete;
+
+    // False, and nothing added, when an equal binding is recorded already.
+    bool AddBinding(const std::string& queueName, const std::vector<std::string>& keys);
+    // True when an equal binding was found and erased; the rest keep their order.
+    bool RemoveBinding(const std::string& queueName, const std::vector<std::string>& keys);
+    std::vector<AmqpBinding> GetBindings() const;
+    // Takes a waiting notice without waiting.
+    bool TryTakeReturnEvent(ResetEvent& out);
+
+    const uint16_t Id;
+    const std::shared_ptr<EnvelopeQueue> Envelopes;
+    const std::shared_ptr<ReturnEventQueue> ReturnEvents;
+    // Posted when the channel must be declared and bound anew.
+    Semaphore ChannelReset;
+
+private:
+    mutable std::recursive_mutex BindingMutex;
+    std::vector<AmqpBinding> Bindings;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,355 @@
+#include "messagebus/AmqpConnection.h"
+
+#include <amqp_ssl_socket.h>
+#include <amqp_tcp_socket.h>
+#include <netinet/in.h>
+#include <netinet/tcp.h>
+#include <sys/socket.h>
+#include <sys/time.h>
+
+#include <algorithm>
+#include <ctime>
+#include <utility>
+#include <vector>
+
+#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/AmqpErrorCodes.h"
+#include "messagebus/AmqpReplyText.h"
+#include "messagebus/CaCertificate.h"
+#include "messagebus/TlsSocketRules.h"
+
+namespace Korvane::Veldra::MessageBus {
+namespace {
+
+using std::chrono::milliseconds;
+using std::chrono::steady_clock;
+
+constexpr int kFrameMax = 131072;
+constexpr int32_t kLongestAttemptMs = 10000;
+constexpr auto kPauseAfterSocketError = std::chrono::seconds(5);
+
+// A broker that goes silent without closing the socket would otherwise hold a
+// blocked send or receive of rabbitmq-c, and the gate, without end: the
+// socket is non-blocking and the library polls it with no limit in places.
+// Keep-alive probes end the connection some 60 seconds after the peer stops
+// answering, and unacknowledged data (a full send window included) after the
+// same time.
+constexpr int kKeepAliveIdleSeconds = 30;
+constexpr int kKeepAliveIntervalSeconds = 10;
+constexpr int kKeepAliveProbes = 3;
+constexpr unsigned kUserTimeoutMs = 60000;
+
+// The statuses after which another attempt can succeed; each has used up its
+// attempt's time except a refused connection (socket error).
+bool IsRetriedOpenStatus(int status) {
+    switch (status) {
+        case AMQP_STATUS_CONNECTION_CLOSED:
+        case AMQP_STATUS_HOSTNAME_RESOLUTION_FAILED:
+        case AMQP_STATUS_TIMEOUT:
+        case AMQP_STATUS_SOCKET_ERROR:
+        case AMQP_STATUS_SOCKET_CLOSED:
+        case AMQP_STATUS_HEARTBEAT_TIMEOUT:
+            return true;
+        default:
+            return false;
+    }
+}
+
+void BoundSilentPeer(amqp_connection_state_t state) {
+    const int fd = amqp_get_sockfd(state);
+    if (fd < 0) return;
+    const int on = 1;
+    // Best effort: a socket that refuses an option keeps the library's waits.
+    setsockopt(fd, SOL_SOCKET, SO_KEEPALIVE, &on, sizeof on);
+    setsockopt(fd, IPPROTO_TCP, TCP_KEEPIDLE, &kKeepAliveIdleSeconds, sizeof(int));
+    setsockopt(fd, IPPROTO_TCP, TCP_KEEPINTVL, &kKeepAliveIntervalSeconds, sizeof(int));
+    setsockopt(fd, IPPROTO_TCP, TCP_KEEPCNT, &kKeepAliveProbes, sizeof(int));
+    setsockopt(fd, IPPROTO_TCP, TCP_USER_TIMEOUT, &kUserTimeoutMs, sizeof(unsigned));
+}
+
+struct ConnectionStateDeleter {
+    void operator()(amqp_connection_state_t state) const { amqp_destroy_connection(state); }
+};
+using OwnedState = std::unique_ptr<amqp_connection_state_t_, ConnectionStateDeleter>;
+
+std::string TimeoutText(int32_t timeoutMs) {
+    return timeoutMs < 0 ? "infinite" : std::to_string(timeoutMs) + "ms";
+}
+
+}  // namespace
+
+AmqpConnection::AmqpConnection(AmqpConnectionManager* manager, std::string user,
+                               std::string password, std::string host, int32_t port,
+                               std::string exchangeName, bool useTls, std::string tlsServerName,
+                               std::string certPath, int32_t connectTimeoutMs,
+                               int32_t heartbeatSeconds)
+    : AmqpConnection(manager, std::move(user), std::move(password), std::move(host), port,
+                     std::move(exchangeName), useTls, std::move(tlsServerName), std::move(certPath),
+                     connectTimeoutMs, heartbeatSeconds, SslInitLibrary::Process()) {}
+
+AmqpConnection::AmqpConnection(AmqpConnectionManager* manager, std::string user,
+                               std::string password, std::string host, int32_t port,
+                               std::string exchangeName, bool useTls, std::string tlsServerName,
+                               std::string certPath, int32_t connectTimeoutMs,
+                               int32_t heartbeatSeconds, SslInitLibrary& sslLibrary)
+    : ConnectTimeoutMs(connectTimeoutMs),
+      HeartbeatSeconds(heartbeatSeconds),
+      User(std::move(user)),
+      Password(std::move(password)),
+      Host(std::move(host)),
+      Port(port),
+      ExchangeName(std::move(exchangeName)),
+      UseTls(useTls),
+      TlsServerName(std::move(tlsServerName)),
+      CertPath(std::move(certPath)),
+      Manager(manager),
+      SslLease(sslLibrary) {
+    // OpenSSL's start-up belongs to the platform library acquired above.
+    amqp_set_initialize_ssl_library(0);
+    Connect();
+}
+
+AmqpConnection::~AmqpConnection() {
+    try {
+        CloseConnection();
+    } catch (...) {
+        // A connection that cannot be closed is gone all the same.
+    }
+}
+
+void AmqpConnection::Connect() {
+    Log("Connecting to AMQP with " + TimeoutText(ConnectTimeoutMs) + " timeout...");
+    ControlGateGuard gate(Gate);
+    OwnedState state(amqp_new_connection());
+    if (!state) {
+        throw AmqpException(AmqpErrorCodes::kOpeningTCPConnection, "No TCP connection.", 0);
+    }
+    amqp_socket_t* socket = NewSocket(state.get());
+    const int status = OpenSocket(socket);
+    if (status != AMQP_STATUS_OK) ThrowOpenFailure(status);
+
+    BoundSilentPeer(state.get());
+    CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
+                          User.c_str(), Password.c_str()),
+               AmqpErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
+
+    // Nobody else can be using the replaced state: every call takes the gate.
+    if (Connection != nullptr) amqp_destroy_connection(Connection);
+    Connection = state.release();
+    Socket = socket;
+
+    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    std::vector<uint16_t> ids;
+    for (const auto& entry : Channels) ids.push_back(entry.first);
+    std::sort(ids.begin(), ids.end());
+    for (const uint16_t id : ids) OpenChannel(id);
+    Log("Successfully connected to AMQP.");
+}
+
+amqp_socket_t* AmqpConnection::NewSocket(amqp_connection_state_t state) {
+    if (!UseTls) {
+        amqp_socket_t* socket = amqp_tcp_socket_new(state);
+        if (socket == nullptr) {
+            throw AmqpException(AmqpErrorCodes::kCreatingTCPSocket, "Error creating TCP socket.");
+        }
+        return socket;
+    }
+    amqp_socket_t* socket = amqp_ssl_socket_new(state);
+    if (socket == nullptr) {
+        throw AmqpException(AmqpErrorCodes::kCreatingSSLSocket, "Error creating SSL/TLS socket.");
+    }
+    amqp_ssl_socket_set_verify_peer(socket, 1);
+    amqp_ssl_socket_set_verify_hostname(socket, VerifiesHostName(Host) ? 1 : 0);
+    const std::string caPath = ResolveCaCertificatePath(CertPath);
+    const int status = amqp_ssl_socket_set_cacert(socket, caPath.c_str());
+    if (status != AMQP_STATUS_OK) {
+        throw AmqpException(
+            AmqpErrorCodes::kSettingCACertificate,
+            "Error setting CA certificate: " + caPath + ". AMQP status " + std::to_string(status),
+            status);
+    }
+    return socket;
+}
+
+int AmqpConnection::OpenSocket(amqp_socket_t* socket) {
+    if (ConnectTimeoutMs < 0) {
+        return amqp_socket_open_noblock(socket, Host.c_str(), Port, nullptr);
+    }
+    const int32_t attemptMs = std::min(ConnectTimeoutMs, kLongestAttemptMs);
+    const auto deadline = steady_clock::now() + milliseconds(ConnectTimeoutMs);
+    for (;;) {
+        timeval attempt{attemptMs / 1000, (attemptMs % 1000) * 1000};
+        const int status = amqp_socket_open_noblock(socket, Host.c_str(), Port, &attempt);
+        const auto remaining =
+            std::chrono::duration_cast<milliseconds>(deadline - steady_clock::now());
+        if (remaining.count() <= 0 || !IsRetriedOpenStatus(status) || StopRequested) {
+            return status;
+        }
+        if (status == AMQP_STATUS_SOCKET_ERROR) {
+            // A refused connection fails at once: wait before the next try,
+            // but not past the deadline.
+            PauseBetweenAttempts(
+                std::min<steady_clock::duration>(kPauseAfterSocketError, remaining));
+            if (StopRequested) return status;
+        }
+    }
+}
+
+void AmqpConnection::PauseBetweenAttempts(steady_clock::duration pause) {
+    std::unique_lock<std::mutex> lock(PauseMutex);
+    PauseWake.wait_for(lock, pause, [this] { return StopRequested.load(); });
+}
+
+void AmqpConnection::RequestStop() {
+    {
+        std::lock_guard<std::mutex> lock(PauseMutex);
+        StopRequested = true;
+    }
+    PauseWake.notify_all();
+}
+
+void AmqpConnection::ThrowOpenFailure(int status) const {
+    const std::string statusText = std::to_string(status);
+    if (status != AMQP_STATUS_SSL_PEER_VERIFY_FAILED) {
+        throw AmqpException(
+            AmqpErrorCodes::kOpeningSocket,
+            "Error opening TCP socket. RabbitMQ client (rabbitmq-c) status code: " + statusText,
+            status);
+    }
+    // Tell an expired certificate (or a wrong clock) from a broker that the
+    // CA did not sign.
+    const CaCertificate certificate(ResolveCaCertificatePath(CertPath));
+    if (certificate.Get() == nullptr) {
+        throw VeldraException(AmqpErrorCodes::kFailedToLoadCertificate,
+                              "Auto cert not initialized.");
+    }
+    if (certificate.IsExpiredAt(std::time(nullptr))) {
+        throw AmqpException(AmqpErrorCodes::kCertificateExpired,
+                            "Certificate expired or system time incorrect. RabbitMQ client "
+                            "(rabbitmq-c) status code: " +
+                                statusText,
+                            status);
+    }
+    throw AmqpException(
+        AmqpErrorCodes::kPeerVerifyFailed,
+        "SSL peer verification failed. RabbitMQ client (rabbitmq-c) status code: " + statusText,
+        status);
+}
+
+std::shared_ptr<AmqpChannel> AmqpConnection::CreateChannel() {
+    ControlGateGuard gate(Gate);
+    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    const uint16_t id = LowestFreeChannelId(Channels);
+    if (id == 0) {
+        throw AmqpException(AmqpErrorCodes::kOpeningChannel,
+                            "Error opening AMQP channel. No free channel number.");
+    }
+    OpenChannel(id);
+    auto channel = std::make_shared<AmqpChannel>(id, std::make_shared<EnvelopeQueue>());
+    Channels.emplace(id, channel);
+    if (!ExchangeDeclared) {
+        DeclareExchange(id);
+        ExchangeDeclared = true;
+    }
+    return channel;
+}
+
+void AmqpConnection::CloseChannel(uint16_t channelId) {
+    ControlGateGuard gate(Gate);
+    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    if (Channels.erase(channelId) == 0 || Connection == nullptr) return;
+    // The number goes back to CreateChannel, and opening a channel that is
+    // still open would make the broker close the whole connection.
+    const amqp_rpc_reply_t reply = amqp_channel_close(Connection, channelId, AMQP_REPLY_SUCCESS);
+    if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
+        Log("Error closing AMQP channel " + std::to_string(channelId) + ". " +
+            AmqpReplyText(reply));
+    }
+}
+
+std::shared_ptr<AmqpChannel> AmqpConnection::FindChannel(uint16_t channelId) const {
+    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    const auto found = Channels.find(channelId);
+    return found == Channels.end() ? nullptr : found->second;
+}
+
+bool AmqpConnection::IsConnected() const {
+    ControlGateGuard gate(Gate);
+    return Connection != nullptr;
+}
+
+void AmqpConnection::OpenChannel(uint16_t channelId) {
+    const std::string context = "Error opening AMQP channel. ";
+    ControlGateGuard gate(Gate);
+    RequireConnection(AmqpErrorCodes::kOpeningChannel, context);
+    amqp_channel_open(Connection, channelId);
+    CheckReply(LastReply(), AmqpErrorCodes::kOpeningChannel, context);
+}
+
+void AmqpConnection::DeclareExchange(uint16_t channelId) {
+    const std::string context =
+        "Error declaring topic exchange. Channel ID: " + std::to_string(channelId) +
+        ". Exchange name: \"" + ExchangeName + "\". ";
+    ControlGateGuard gate(Gate);
+    RequireConnection(AmqpErrorCodes::kDeclaringExchange, context);
+    amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
+                          amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
+    CheckReply(LastReply(), AmqpErrorCodes::kDeclaringExchange, context);
+}
+
+void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t prefetchCount,
+                            bool global) {
+    const std::string context =
+        "Error changing quality of service. Channel ID: " + std::to_string(channelId) +
+        ". Prefetch size: " + std::to_string(prefetchSize) +
+        ". Prefetch count: " + std::to_string(prefetchCount) +
+        ". Global: " + (global ? "true" : "false") + ". ";
+    ControlGateGuard gate(Gate);
+    RequireConnection(AmqpErrorCodes::kSettingQoS, context);
+    amqp_basic_qos(Connection, channelId, prefetchSize, prefetchCount, global ? 1 : 0);
+    CheckReply(LastReply(), AmqpErrorCodes::kSettingQoS, context);
+}
+
+void AmqpConnection::CloseConnection() {
+    ControlGateGuard gate(Gate);
+    if (Connection == nullptr) return;
+    const amqp_rpc_reply_t reply = amqp_connection_close(Connection, AMQP_REPLY_SUCCESS);
+    // The state goes whatever the broker said, so that nothing is left open.
+    const int status = amqp_destroy_connection(Connection);
+    Connection = nullptr;
+    Socket = nullptr;
+    CheckReply(reply, AmqpErrorCodes::kClosingTCPConnection, "Error closing connection. ");
+    if (status != AMQP_STATUS_OK) {
+        throw AmqpException(AmqpErrorCodes::kEndingTCPConnection,
+                            "Error ending connection.  AMQP status: " + std::to_string(status),
+                            status);
+    }
+}
+
+std::string AmqpConnection::ReplyText(const amqp_rpc_reply_t& reply) {
+    return AmqpReplyText(reply);
+}
+
+void AmqpConnection::Log(const std::string& line) const {
+    if (Manager != nullptr) Manager->Log(line);
+}
+
+void AmqpConnection::ReportError(const VeldraException& error) const {
+    if (Manager != nullptr) Manager->SetLastError(error);
+}
+
+void AmqpConnection::CheckReply(const amqp_rpc_reply_t& reply, int32_t code,
+                                const std::string& context) {
+    if (reply.reply_type == AMQP_RESPONSE_NORMAL) return;
+    throw AmqpException(code, context + AmqpReplyText(reply), reply.library_error);
+}
+
+amqp_rpc_reply_t AmqpConnection::LastReply() const {
+    return Connection == nullptr ? AmqpNoReply() : amqp_get_rpc_reply(Connection);
+}
+
+void AmqpConnection::RequireConnection(int32_t code, const std::string& context) const {
+    if (Connection == nullptr) CheckReply(AmqpNoReply(), code, context);
+}
+
+}  // namespace Korvane::Veldra::MessageBus

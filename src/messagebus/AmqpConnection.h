@@ -1,0 +1,144 @@
+#pragma once
+
+#include <amqp.h>
+
+#include <atomic>
+#include <chrono>
+#include <condition_variable>
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <unordered_map>
+
+#include "errors/AmqpException.h"
+#include "messagebus/AmqpChannel.h"
+#include "messagebus/AmqpGate.h"
+#include "messagebus/Semaphore.h"
+#include "messagebus/SslInitLibrary.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+class AmqpConnectionManager;
+
+// One rabbitmq-c connection to the broker and the channels opened on it. The
+// publisher and the consumer connection derive from it and add the reader and
+// reconnect threads. The constructor connects; every AMQP call runs under the
+// gate, which gives control operations and publishes precedence over the
+// reader's next poll.
+class AmqpConnection {
+public:
+    // A negative connectTimeoutMs waits without limit.
+    AmqpConnection(AmqpConnectionManager* manager, std::string user, std::string password,
+                   std::string host, int32_t port, std::string exchangeName, bool useTls,
+                   std::string tlsServerName, std::string certPath, int32_t connectTimeoutMs,
+                   int32_t heartbeatSeconds);
+    AmqpConnection(const AmqpConnection&) = delete;
+    AmqpConnection& operator=(const AmqpConnection&) = delete;
+
+    // Opens the lowest free channel number from 1, records it, and declares
+    // the exchange on the first channel of this connection object.
+    virtual std::shared_ptr<AmqpChannel> CreateChannel();
+    // Forgets the channel and closes its AMQP channel, so that its number can
+    // be taken again.
+    virtual void CloseChannel(uint16_t channelId);
+    // Closes the connection, if any, then releases the TLS start-up library.
+    virtual ~AmqpConnection();
+    // The body of the reconnect thread.
+    virtual void ReconnectLoop() = 0;
+    // The body of the reader thread.
+    virtual void ReaderLoop() = 0;
+
+    // Opens the socket, logs in, and opens every recorded channel again with
+    // its number. Also the reconnect step.
+    void Connect();
+    void OpenChannel(uint16_t channelId);
+    // The topic exchange ExchangeName: durable, not auto-deleted, not internal.
+    void DeclareExchange(uint16_t channelId);
+    void SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t prefetchCount, bool global);
+    // Closes with 200 and destroys the connection state.
+    void CloseConnection();
+
+    // The text form of a reply, as it appears in the failure texts.
+    static std::string ReplyText(const amqp_rpc_reply_t& reply);
+
+    const std::string& GetExchangeName() const { return ExchangeName; }
+    // The recorded channel of a number, or null.
+    std::shared_ptr<AmqpChannel> FindChannel(uint16_t channelId) const;
+    bool IsConnected() const;
+
+protected:
+    // As the public constructor, with the TLS start-up library given: tests
+    // use one that does not load the platform's library.
+    AmqpConnection(AmqpConnectionManager* manager, std::string user, std::string password,
+                   std::string host, int32_t port, std::string exchangeName, bool useTls,
+                   std::string tlsServerName, std::string certPath, int32_t connectTimeoutMs,
+                   int32_t heartbeatSeconds, SslInitLibrary& sslLibrary);
+
+    // Guards for the gate: ControlGateGuard around every control operation
+    // and publish; ReaderGateGuard around one poll of a reader thread.
+    using ControlGateGuard = AmqpGate::Control;
+    using ReaderGateGuard = AmqpGate::Reader;
+
+    // Sets StopRequested and cuts short the wait between connect attempts, so
+    // a Connect in progress ends at its current attempt.
+    void RequestStop();
+
+    // A status line to the manager's log (nothing without a manager).
+    void Log(const std::string& line) const;
+    // Hands an error that has no caller to the manager's last error.
+    void ReportError(const VeldraException& error) const;
+
+    // Throws AmqpException(code, context + ReplyText(reply), library_error)
+    // unless the reply is normal.
+    static void CheckReply(const amqp_rpc_reply_t& reply, int32_t code, const std::string& context);
+    // The reply of the last method call on Connection; "no reply" without a
+    // connection. Call with the gate held.
+    amqp_rpc_reply_t LastReply() const;
+    // Throws AmqpException(code, context + "No AMQP Response") when there is
+    // no connection. Call with the gate held.
+    void RequireConnection(int32_t code, const std::string& context) const;
+
+    // ---- The design's fields ----
+    std::unordered_map<uint16_t, std::shared_ptr<AmqpChannel>> Channels;
+    amqp_connection_state_t Connection = nullptr;
+    amqp_socket_t* Socket = nullptr;
+    const int32_t ConnectTimeoutMs;
+    const int32_t HeartbeatSeconds;
+    const std::string User;
+    const std::string Password;
+    const std::string Host;
+    const int32_t Port;
+    const std::string ExchangeName;
+    const bool UseTls;
+    const std::string TlsServerName;  // kept; no step reads it
+    const std::string CertPath;
+    bool ExchangeDeclared = false;
+    mutable std::recursive_mutex ChannelMutex;
+    AmqpConnectionManager* const Manager;
+    std::mutex StartMutex;
+    std::atomic<bool> StopRequested{false};
+    std::atomic<bool> Disconnected{false};
+    std::unique_ptr<std::thread> ReconnectThread;
+    std::unique_ptr<std::thread> ReaderThread;
+    Semaphore ReconnectSignal;
+    Semaphore WakeSignal;
+    // GateMutex, GateWaiters and GateIdle.
+    mutable AmqpGate Gate;
+
+private:
+    // Opens the socket within the time-out rules; returns the last status.
+    int OpenSocket(amqp_socket_t* socket);
+    // Sleeps for up to the given time, less when a stop is requested.
+    void PauseBetweenAttempts(std::chrono::steady_clock::duration pause);
+    // Builds the TLS or TCP socket on the new connection state.
+    amqp_socket_t* NewSocket(amqp_connection_state_t state);
+    [[noreturn]] void ThrowOpenFailure(int status) const;
+
+    SslInitLease SslLease;
+    std::mutex PauseMutex;
+    std::condition_variable PauseWake;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,203 @@
+#include "messagebus/AmqpConnectionManager.h"
+
+#include <utility>
+
+#include "messagebus/AmqpConsumerConnection.h"
+#include "messagebus/AmqpErrorCodes.h"
+#include "messagebus/AmqpPublisherConnection.h"
+#include "messagebus/BusConfigurations.h"
+
+namespace Korvane::Veldra::MessageBus {
+namespace {
+
+// The number of a channel handed in by a caller; a null channel is refused.
+uint16_t IdOf(const std::shared_ptr<AmqpChannel>& channel) {
+    if (!channel) throw VeldraException(AmqpErrorCodes::kException, "No AMQP channel given.");
+    return channel->Id;
+}
+
+}  // namespace
+
+std::recursive_mutex AmqpConnectionManager::ManagerMutex;
+AmqpConnectionManager* AmqpConnectionManager::Instance = nullptr;
+
+AmqpConnectionManager::AmqpConnectionManager()
+    : AmqpConnectionManager(BusConfigurations::GetSelected().Configuration) {}
+
+AmqpConnectionManager::AmqpConnectionManager(const VeldraConfiguration& configuration)
+    : Host(configuration.Host.value_or("")),
+      ExchangeName(configuration.ExchangeName.value_or("")),
+      User(configuration.User.value_or("")),
+      Password(configuration.Password.value_or("")),
+      UseTls(configuration.UseTls.value_or(false)),
+      TlsServerName(configuration.TlsServerName.value_or("")),
+      CertPath(configuration.CertPath.value_or("")),
+      Port(configuration.Port.value_or(0)) {}
+
+AmqpConnectionManager::~AmqpConnectionManager() {
+    std::shared_ptr<AmqpConsumerConnection> consumer;
+    std::shared_ptr<AmqpPublisherConnection> publisher;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        LastError.reset();
+        consumer = std::move(Consumer);
+        publisher = std::move(Publisher);
+    }
+    // The connections' threads are stopped and joined without the class-wide
+    // mutex: they take it themselves to report an error or deliver a notice.
+    if (consumer) {
+        try {
+            consumer->Stop();
+        } catch (...) {
+            // Its destructor stops what is left.
+        }
+    }
+    consumer.reset();
+    publisher.reset();
+}
+
+AmqpConnectionManager* AmqpConnectionManager::GetInstance() {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    if (Instance == nullptr) Instance = new AmqpConnectionManager();
+    return Instance;
+}
+
+void AmqpConnectionManager::ReleaseInstance() {
+    AmqpConnectionManager* instance = nullptr;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        std::swap(instance, Instance);
+    }
+    // Deleted after the mutex is released; see the destructor.
+    delete instance;
+}
+
+void AmqpConnectionManager::SetConnectTimeout(int32_t timeoutMs) {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    ConnectTimeoutMs = timeoutMs;
+}
+
+int32_t AmqpConnectionManager::GetConnectTimeout() const {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    return ConnectTimeoutMs;
+}
+
+template <typename Connection>
+std::shared_ptr<Connection> AmqpConnectionManager::GetOrMake(std::shared_ptr<Connection>& field) {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    if (!field) {
+        field = std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
+                                             TlsServerName, CertPath, ConnectTimeoutMs,
+                                             HeartbeatSeconds);
+    }
+    return field;
+}
+
+std::shared_ptr<AmqpPublisherConnection> AmqpConnectionManager::GetPublisherConnection() {
+    return GetOrMake(Publisher);
+}
+
+std::shared_ptr<AmqpConsumerConnection> AmqpConnectionManager::GetConsumerConnection() {
+    return GetOrMake(Consumer);
+}
+
+std::shared_ptr<AmqpChannel> AmqpConnectionManager::CreatePublisherChannel() {
+    return GetPublisherConnection()->CreateChannel();
+}
+
+std::shared_ptr<AmqpChannel> AmqpConnectionManager::CreateConsumerChannel() {
+    return GetConsumerConnection()->CreateChannel();
+}
+
+void AmqpConnectionManager::Publish(const std::shared_ptr<AmqpChannel>& channel,
+                                    const MessageHeaders& envelope, const MessageBody& body,
+                                    bool mandatory) {
+    GetPublisherConnection()->Publish(IdOf(channel), envelope, body, mandatory);
+}
+
+void AmqpConnectionManager::DeclareQueue(const std::shared_ptr<AmqpChannel>& channel,
+                                         const std::string& queueName, bool durable, bool exclusive,
+                                         bool autoDelete) {
+    GetConsumerConnection()->DeclareQueue(IdOf(channel), queueName, durable, exclusive, autoDelete);
+}
+
+void AmqpConnectionManager::SetQos(const std::shared_ptr<AmqpChannel>& channel,
+                                   uint32_t prefetchSize, uint16_t prefetchCount, bool global) {
+    GetConsumerConnection()->SetQos(IdOf(channel), prefetchSize, prefetchCount, global);
+}
+
+void AmqpConnectionManager::AddBinding(const std::shared_ptr<AmqpChannel>& channel,
+                                       const std::string& queueName,
+                                       const std::vector<std::string>& keys, bool noAck) {
+    const uint16_t id = IdOf(channel);
+    if (channel->AddBinding(queueName, keys)) {
+        GetConsumerConnection()->BindAndConsume(id, queueName, keys, noAck);
+    }
+}
+
+void AmqpConnectionManager::RemoveBinding(const std::shared_ptr<AmqpChannel>& channel,
+                                          const std::string& queueName,
+                                          const std::vector<std::string>& keys) {
+    const uint16_t id = IdOf(channel);
+    if (channel->RemoveBinding(queueName, keys)) {
+        GetConsumerConnection()->Unbind(id, queueName, keys);
+    }
+}
+
+void AmqpConnectionManager::RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck) {
+    const uint16_t id = IdOf(channel);
+    const auto consumer = GetConsumerConnection();
+    for (const AmqpBinding& binding : channel->GetBindings()) {
+        consumer->BindAndConsume(id, binding.QueueName, binding.Keys, noAck);
+    }
+}
+
+void AmqpConnectionManager::Ack(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag) {
+    GetConsumerConnection()->Ack(IdOf(channel), deliveryTag);
+}
+
+void AmqpConnectionManager::Requeue(const std::shared_ptr<AmqpChannel>& channel,
+                                    uint64_t deliveryTag) {
+    GetConsumerConnection()->Requeue(IdOf(channel), deliveryTag);
+}
+
+void AmqpConnectionManager::Start() {
+    GetConsumerConnection()->Start();
+}
+
+void AmqpConnectionManager::Stop() {
+    GetConsumerConnection()->Stop();
+}
+
+void AmqpConnectionManager::DeliverReturnEvent(const ResetEvent& event) {
+    // Called from the publisher's reader: never makes a connection, and with
+    // no consumer connection nobody waits for the notice.
+    std::shared_ptr<AmqpConsumerConnection> consumer;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        consumer = Consumer;
+    }
+    if (consumer) consumer->DeliverReturnEvent(event);
+}
+
+void AmqpConnectionManager::Log(const std::string& line) {
+    StatusLines.Add(line);
+}
+
+bool AmqpConnectionManager::TakeLog(std::string& line, uint32_t timeoutMs) {
+    return StatusLines.TryTake(line, timeoutMs);
+}
+
+void AmqpConnectionManager::SetLastError(const VeldraException& error) {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    LastError = std::make_unique<VeldraException>(error.Code(), error.what());
+}
+
+bool AmqpConnectionManager::GetLastError(VeldraException& error) const {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    if (!LastError) return false;
+    error = VeldraException(LastError->Code(), LastError->what());
+    return true;
+}
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,124 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "errors/VeldraException.h"
+#include "messagebus/AmqpChannel.h"
+#include "messagebus/ResetEvent.h"
+#include "messagebus/SharedQueue.h"
+#include "messagebus/VeldraConfiguration.h"
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageHeaders.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+class AmqpPublisherConnection;
+class AmqpConsumerConnection;
+
+// The settings of one broker configuration and the two connections made from
+// them on first use, one outgoing and one incoming. It is the one door through
+// which publishers and consumers reach the broker, and it keeps the bus's
+// status lines and its last asynchronous error. There is a process singleton,
+// and any number of private instances.
+class AmqpConnectionManager {
+public:
+    static constexpr int32_t kHeartbeatSeconds = 270;
+    static constexpr int32_t kDefaultConnectTimeoutMs = 180000;
+
+    // Settings from the selected configuration of the process.
+    AmqpConnectionManager();
+    // Settings from the given record; absent fields are empty, 0 or false.
+    explicit AmqpConnectionManager(const VeldraConfiguration& configuration);
+    // Stops the consumer connection, then releases both connections; their
+    // threads end in their destructors.
+    ~AmqpConnectionManager();
+    AmqpConnectionManager(const AmqpConnectionManager&) = delete;
+    AmqpConnectionManager& operator=(const AmqpConnectionManager&) = delete;
+
+    // ---- The process singleton ----
+    static AmqpConnectionManager* GetInstance();
+    // Deletes the singleton, if any.
+    static void ReleaseInstance();
+
+    // For connections made after the call.
+    void SetConnectTimeout(int32_t timeoutMs);
+
+    // The connection, made (and connected) on first use under the class-wide
+    // mutex. A failed construction leaves none, so the next use tries again.
+    std::shared_ptr<AmqpPublisherConnection> GetPublisherConnection();
+    std::shared_ptr<AmqpConsumerConnection> GetConsumerConnection();
+    std::shared_ptr<AmqpChannel> CreatePublisherChannel();
+    std::shared_ptr<AmqpChannel> CreateConsumerChannel();
+
+    void Publish(const std::shared_ptr<AmqpChannel>& channel, const MessageHeaders& envelope,
+                 const MessageBody& body, bool mandatory);
+    void DeclareQueue(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
+                      bool durable, bool exclusive, bool autoDelete);
+    void SetQos(const std::shared_ptr<AmqpChannel>& channel, uint32_t prefetchSize,
+                uint16_t prefetchCount, bool global);
+    // Binds and consumes only when the channel did not record this binding.
+    void AddBinding(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
+                    const std::vector<std::string>& keys, bool noAck);
+    // Unbinds only when the channel had recorded this binding.
+    void RemoveBinding(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
+                       const std::vector<std::string>& keys);
+    // Binds and consumes every recorded binding of the channel again.
+    void RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck);
+    void Ack(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag);
+    void Requeue(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag);
+    // Start and Stop of the consumer connection.
+    void Start();
+    void Stop();
+    // Gives the notice to every channel of the consumer connection.
+    void DeliverReturnEvent(const ResetEvent& event);
+
+    // ---- Status lines and the last asynchronous error ----
+    void Log(const std::string& line);
+    bool TakeLog(std::string& line, uint32_t timeoutMs);
+    // Keeps a copy of text and code; an AmqpException's status is not kept.
+    void SetLastError(const VeldraException& error);
+    // Copies the stored error into error; false when there is none.
+    bool GetLastError(VeldraException& error) const;
+
+    // ---- Settings ----
+    const std::string& GetHost() const { return Host; }
+    const std::string& GetExchangeName() const { return ExchangeName; }
+    const std::string& GetUser() const { return User; }
+    bool GetUseTls() const { return UseTls; }
+    const std::string& GetTlsServerName() const { return TlsServerName; }
+    const std::string& GetCertPath() const { return CertPath; }
+    int32_t GetPort() const { return Port; }
+    int32_t GetHeartbeatSeconds() const { return HeartbeatSeconds; }
+    int32_t GetConnectTimeout() const;
+
+private:
+    // Shared by all instances; recursive so that a constructor chain may
+    // reach GetInstance.
+    static std::recursive_mutex ManagerMutex;
+    static AmqpConnectionManager* Instance;
+
+    template <typename Connection>
+    std::shared_ptr<Connection> GetOrMake(std::shared_ptr<Connection>& field);
+
+    std::string Host;
+    std::string ExchangeName;
+    std::string User;
+    std::string Password;
+    bool UseTls = false;
+    std::string TlsServerName;
+    std::string CertPath;
+    int32_t Port = 0;
+    int32_t HeartbeatSeconds = kHeartbeatSeconds;
+    int32_t ConnectTimeoutMs = kDefaultConnectTimeoutMs;
+    // Declared before the connections: their threads log until they end.
+    SharedQueue<std::string> StatusLines;
+    std::unique_ptr<VeldraException> LastError;
+    std::shared_ptr<AmqpPublisherConnection> Publisher;
+    std::shared_ptr<AmqpConsumerConnection> Consumer;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,203 @@
+#include "messagebus/AmqpConsumer.h"
+
+#include <iostream>
+#include <utility>
+
+#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/AmqpErrorCodes.h"
+#include "messagebus/EnvelopeHeaders.h"
+
+namespace Korvane::Veldra::MessageBus {
+namespace {
+
+constexpr uint32_t kWaitMs = 100;
+constexpr const char* kRawMessagesPoint = "RawMessages";
+
+AmqpConnectionManager* ManagerOf(const AmqpConsumerBuilder& builder) {
+    return builder.ConnectionManager != nullptr ? builder.ConnectionManager
+                                                : AmqpConnectionManager::GetInstance();
+}
+
+VeldraException AsVeldraException(const std::exception& error) {
+    if (const auto* veldra = dynamic_cast<const VeldraException*>(&error)) {
+        return VeldraException(veldra->Code(), veldra->what());
+    }
+    return VeldraException(AmqpErrorCodes::kException, error.what());
+}
+
+}  // namespace
+
+AmqpConsumer::AmqpConsumer(const AmqpConsumerBuilder& builder)
+    : QueueName(builder.QueueName),
+      ConsumerName(builder.ConsumerName),
+      Durable(builder.Durable),
+      ManualAck(builder.ManualAck),
+      ReceiveCallback(builder.ReceiveCallback),
+      RawCallback(builder.RawCallback),
+      Manager(ManagerOf(builder)),
+      PrefetchCount(builder.PrefetchCount) {
+    ExchangeName = Manager->GetExchangeName();
+    SetTraceLogger(builder.TraceLogger);
+    Channel = Manager->CreateConsumerChannel();
+    DeclareQueue();
+    Manager->SetQos(Channel, 0, PrefetchCount, false);
+    RebindThread = std::make_unique<std::thread>([this] { RebindLoop(); });
+    try {
+        HandlingThread = std::make_unique<std::thread>([this] { HandlingLoop(); });
+    } catch (...) {
+        StopRebinding = true;
+        Channel->ChannelReset.Release();
+        RebindThread->join();
+        throw;
+    }
+}
+
+AmqpConsumer::~AmqpConsumer() {
+    StopHandling = true;
+    StopRebinding = true;
+    Channel->ChannelReset.Release();
+    StopSignal.Release();
+    HandlingThread->join();
+    RebindThread->join();
+}
+
+void AmqpConsumer::DeclareQueue() {
+    Manager->DeclareQueue(Channel, QueueName, Durable, false, !Durable);
+}
+
+void AmqpConsumer::Bind(const std::vector<std::string>& keys) {
+    Manager->AddBinding(Channel, QueueName, keys, !ManualAck);
+}
+
+void AmqpConsumer::Unbind(const std::vector<std::string>& keys) {
+    Manager->RemoveBinding(Channel, QueueName, keys);
+}
+
+void AmqpConsumer::StartConsuming() {
+    Consuming = true;
+    Manager->Start();
+}
+
+void AmqpConsumer::StopConsuming() {
+    Consuming = false;
+    Manager->Stop();
+}
+
+void AmqpConsumer::Ack(uint64_t deliveryTag) {
+    Manager->Ack(Channel, deliveryTag);
+}
+
+void AmqpConsumer::Requeue(uint64_t deliveryTag) {
+    Manager->Requeue(Channel, deliveryTag);
+}
+
+void AmqpConsumer::SetTraceLogger(std::shared_ptr<Interfaces::ITraceLogger> traceLogger) {
+    TracePoint rawMessages(kRawMessagesPoint);
+    if (traceLogger) rawMessages = traceLogger->GetTracePoint(kRawMessagesPoint);
+    std::lock_guard<std::mutex> lock(LoggerMutex);
+    TraceLogger = std::move(traceLogger);
+    RawMessagesPoint = std::move(rawMessages);
+}
+
+std::shared_ptr<Interfaces::ITraceLogger> AmqpConsumer::Logger(TracePoint* rawMessages) {
+    std::lock_guard<std::mutex> lock(LoggerMutex);
+    if (rawMessages != nullptr) *rawMessages = RawMessagesPoint;
+    return TraceLogger;
+}
+
+void AmqpConsumer::RebindLoop() {
+    try {
+        while (!StopRebinding) {
+            Channel->ChannelReset.Wait();
+            if (StopRebinding) return;
+            // Queue first, then every binding with its consume: this is what
+            // restores the consumer on a new connection or channel.
+            try {
+                DeclareQueue();
+                Manager->RebindAll(Channel, !ManualAck);
+            } catch (const std::exception& error) {
+                Manager->SetLastError(AsVeldraException(error));
+            }
+        }
+    } catch (const std::exception& error) {
+        // The wait itself failed.
+        Manager->SetLastError(AsVeldraException(error));
+    }
+}
+
+void AmqpConsumer::HandlingLoop() {
+    for (;;) {
+        if (StopHandling) return;
+        try {
+            if (!Started) {
+                if (!Consuming) {
+                    if (StopSignal.Acquire(kWaitMs)) return;
+                    continue;
+                }
+                Started = true;
+            }
+            // Once started the thread goes on draining the queue after
+            // StopConsuming, until it is told to stop.
+            do {
+                HandleOnce();
+            } while (Consuming && !StopHandling);
+        } catch (const std::exception& error) {
+            if (Recover(std::string("Caught exception in message handling thread: ") +
+                        error.what())) {
+                return;
+            }
+        } catch (...) {
+            if (Recover("Caught exception in message handling thread!")) return;
+        }
+    }
+}
+
+void AmqpConsumer::HandleOnce() {
+    EnvelopePtr envelope;
+    if (Channel->Envelopes->TryTake(envelope, kWaitMs)) Dispatch(envelope);
+    ResetEvent returned;
+    if (Channel->TryTakeReturnEvent(returned) && ReceiveCallback) {
+        ReceiveCallback->PublishFailed(returned);
+    }
+}
+
+bool AmqpConsumer::Recover(const std::string& line) {
+    try {
+        ReportLine(line);
+        // Declare and bind anew: the failure may have left the channel unusable.
+        Channel->ChannelReset.Release();
+        return StopSignal.Acquire(kWaitMs);
+    } catch (...) {
+        return true;
+    }
+}
+
+void AmqpConsumer::ReportLine(const std::string& line) {
+    if (const auto logger = Logger()) {
+        logger->Error(line);
+    } else {
+        Manager->Log(line);
+    }
+}
+
+void AmqpConsumer::Dispatch(const EnvelopePtr& envelope) {
+    if (RawCallback) {
+        RawCallback(envelope);
+        return;
+    }
+    TracePoint rawMessages;
+    const auto logger = Logger(&rawMessages);
+    if (!ReceiveCallback) {
+        if (logger) {
+            logger->Error("No callback defined for " + QueueName);
+        } else {
+            std::cout << "No callback defined, and no tracelogger!" << std::endl;
+        }
+        return;
+    }
+    const auto message = MessageFromEnvelope(*envelope, ConsumerTag);
+    if (logger && rawMessages.enabled) logger->Log(rawMessages, "MsgRx | " + message->DebugText());
+    ReceiveCallback->MessageReceived(message);
+}
+
+}  // namespace Korvane::Veldra::MessageBus

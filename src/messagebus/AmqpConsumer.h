@@ -1,0 +1,92 @@
+#pragma once
+
+#include <atomic>
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "messagebus/AmqpChannel.h"
+#include "messagebus/AmqpConsumerBuilder.h"
+#include "messagebus/Semaphore.h"
+#include "utilities/tracelogging/TracePoint.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// One channel of the consumer connection with a queue on it. Its handling
+// thread turns the envelopes the reader sorted into the channel into
+// GenericMessage objects and hands them, and the notices of returned
+// publishes, to the receive callback, one at a time and in arrival order. Its
+// rebind thread declares the queue and binds it again whenever the channel is
+// reset: after a reconnect, a channel close, or a failed callback.
+class AmqpConsumer {
+public:
+    // Opens the channel, declares the queue (auto-deleted unless durable),
+    // sets the prefetch count, then starts the two threads. Consuming starts
+    // with StartConsuming.
+    explicit AmqpConsumer(const AmqpConsumerBuilder& builder);
+    // Ends both threads. The AMQP channel stays open.
+    ~AmqpConsumer();
+    AmqpConsumer(const AmqpConsumer&) = delete;
+    AmqpConsumer& operator=(const AmqpConsumer&) = delete;
+
+    // Records the binding with the manager, which binds and consumes only
+    // when it is new.
+    void Bind(const std::vector<std::string>& keys);
+    // Unbinds only a recorded binding.
+    void Unbind(const std::vector<std::string>& keys);
+    // Lets the handling thread run and counts a Start of the connection.
+    void StartConsuming();
+    // Counts a Stop of the connection; what is queued is still handled.
+    void StopConsuming();
+    void Ack(uint64_t deliveryTag);
+    void Requeue(uint64_t deliveryTag);
+    // Keeps the logger and reads its "RawMessages" point; null is allowed.
+    void SetTraceLogger(std::shared_ptr<Interfaces::ITraceLogger> traceLogger);
+
+    const std::string& GetConsumerTag() const { return ConsumerTag; }
+    const std::string& GetQueueName() const { return QueueName; }
+    const std::shared_ptr<AmqpChannel>& GetChannel() const { return Channel; }
+
+private:
+    void RebindLoop();
+    void HandlingLoop();
+    // Steps 3 and 4 of the handling loop: one envelope, one returned notice.
+    void HandleOnce();
+    void Dispatch(const EnvelopePtr& envelope);
+    // After a failed step: log, ask for a new declaration. True to end.
+    bool Recover(const std::string& line);
+    void ReportLine(const std::string& line);
+    // The logger and its point, as one consistent pair.
+    std::shared_ptr<Interfaces::ITraceLogger> Logger(TracePoint* rawMessages = nullptr);
+    void DeclareQueue();
+
+    // ---- State ----
+    const std::string ConsumerTag;
+    const std::string QueueName;
+    std::string ExchangeName;
+    const std::string ConsumerName;
+    const bool Durable;
+    const bool ManualAck;
+    std::shared_ptr<AmqpChannel> Channel;
+    const std::shared_ptr<Interfaces::IMessageSubscriberReceiveCallback> ReceiveCallback;
+    const RawEnvelopeCallback RawCallback;
+    std::shared_ptr<Interfaces::ITraceLogger> TraceLogger;
+    TracePoint RawMessagesPoint;
+    AmqpConnectionManager* Manager;
+    Semaphore StopSignal;
+    std::atomic<bool> StopHandling{false};
+    std::atomic<bool> StopRebinding{false};
+    std::atomic<bool> Consuming{false};
+    bool Started = false;  // handling thread only
+    std::unique_ptr<std::thread> RebindThread;
+    std::unique_ptr<std::thread> HandlingThread;
+
+    const uint16_t PrefetchCount;
+    // Guards TraceLogger and RawMessagesPoint.
+    std::mutex LoggerMutex;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,82 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "messagebus/AmqpPollingConnection.h"
+#include "messagebus/ResetEvent.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// The routing key of a binding: "Veldra", then "." and each key in order.
+std::string BindingKey(const std::vector<std::string>& keys);
+
+// The connection on which everything arrives. Its reader thread takes the
+// deliveries with a 100 millisecond poll and sorts them into the envelope
+// queues of their channels; it never runs user code. The threads run only
+// while some consumer wants messages: between the first Start and the Stop
+// that matches the last one.
+class AmqpConsumerConnection : public AmqpPollingConnection {
+public:
+    AmqpConsumerConnection(AmqpConnectionManager* manager, std::string user, std::string password,
+                           std::string host, int32_t port, std::string exchangeName, bool useTls,
+                           std::string tlsServerName, std::string certPath,
+                           int32_t connectTimeoutMs, int32_t heartbeatSeconds);
+    // Stops once, then closes the connection. Every consumer must be gone
+    // first: with more than one Start outstanding the threads would remain.
+    ~AmqpConsumerConnection() override;
+
+    std::shared_ptr<AmqpChannel> CreateChannel() override;
+    void CloseChannel(uint16_t channelId) override;
+
+    // Counts the start; the first one starts the reader and the reconnect
+    // thread.
+    void Start();
+    // Counts the stop, never below zero; at zero the threads end.
+    void Stop();
+
+    // amqp_queue_declare, not passive, with no arguments. Throws AmqpException
+    // (Veldra.AMQPErrorDeclaringQueue), or Veldra.AMQPErrorObtainingQueueName
+    // when the broker answers with an empty name.
+    void DeclareQueue(uint16_t channelId, const std::string& queueName, bool durable,
+                      bool exclusive, bool autoDelete);
+    // Binds the queue to the exchange with BindingKey(keys), then starts a
+    // further basic.consume on it.
+    void BindAndConsume(uint16_t channelId, const std::string& queueName,
+                        const std::vector<std::string>& keys, bool noAck);
+    void Unbind(uint16_t channelId, const std::string& queueName,
+                const std::vector<std::string>& keys);
+    // A delivery tag of 0 does nothing.
+    void Ack(uint16_t channelId, uint64_t deliveryTag);
+    // Gives the message back to the queue; a delivery tag of 0 does nothing.
+    void Requeue(uint16_t channelId, uint64_t deliveryTag);
+    // A copy of the notice to the return queue of every channel.
+    void DeliverReturnEvent(const ResetEvent& event);
+
+    void ReaderLoop() override;
+
+    // Start calls not yet matched by Stop.
+    int32_t GetStartCount();
+
+protected:
+    AmqpConsumerConnection(AmqpConnectionManager* manager, std::string user, std::string password,
+                           std::string host, int32_t port, std::string exchangeName, bool useTls,
+                           std::string tlsServerName, std::string certPath,
+                           int32_t connectTimeoutMs, int32_t heartbeatSeconds,
+                           SslInitLibrary& sslLibrary);
+
+    // Posts the reset of every channel, so that the consumers declare and
+    // bind again on the new connection.
+    void OnReconnected() override;
+    void DeliverReturnedMessage(const ResetEvent& event) override;
+
+private:
+    void ReaderStep();
+
+    // ---- State ----
+    int32_t StartCount = 0;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

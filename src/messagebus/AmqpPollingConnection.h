@@ -1,0 +1,90 @@
+#pragma once
+
+#include <sys/time.h>
+
+#include <chrono>
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "messagebus/AmqpConnection.h"
+#include "messagebus/ResetEvent.h"
+#include "messagebus/SocketWatchdog.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// What the publisher and the consumer connection share: a reader thread that
+// polls the socket and sorts what arrives, and a reconnect thread that waits
+// for the reader's signal and connects anew. The reconnect thread also keeps
+// the socket watchdog: a socket call that runs longer than StallLimit() has
+// its socket shut down.
+class AmqpPollingConnection : public AmqpConnection {
+public:
+    using Clock = std::chrono::steady_clock;
+
+    // The lines that differ between the two connections.
+    struct Texts {
+        const char* reconnecting;      // logged before each reconnect
+        const char* connectionClosed;  // logged on connection.close
+        const char* owner;             // names the connection in the no-consumer line
+    };
+
+    // Waits for the reader's signal, connects anew and restarts the reader.
+    // A failed Connect goes to the manager's last error, and the connection
+    // stays down: nothing asks again.
+    void ReconnectLoop() override;
+
+protected:
+    AmqpPollingConnection(AmqpConnectionManager* manager, std::string user, std::string password,
+                          std::string host, int32_t port, std::string exchangeName, bool useTls,
+                          std::string tlsServerName, std::string certPath, int32_t connectTimeoutMs,
+                          int32_t heartbeatSeconds, SslInitLibrary& sslLibrary, Texts texts);
+    ~AmqpPollingConnection() override = default;
+
+    enum class PollOutcome {
+        Delivered,     // an envelope arrived
+        Idle,          // nothing arrived within the time-out
+        Handled,       // another frame arrived and was acted on
+        Failed,        // the connection is lost; a reconnect is under way
+        NotConnected,  // there is no connection to poll
+    };
+    // Takes the gate as a reader for one amqp_consume_message with the
+    // time-out and the action its reply asks for. The notices of returned
+    // messages are handed on after the gate is released.
+    PollOutcome PollOnce(const timeval& timeout);
+
+    // Starts the reader, then the reconnect thread. Call with StartMutex held
+    // and no threads running.
+    void StartThreads();
+    // Ends the reconnect thread, then the reader. Call with StartMutex held
+    // and the threads running.
+    void StopThreads();
+    // Marks the connection lost and asks for a reconnect.
+    void Disconnect();
+    // Called by the reconnect thread after a successful Connect, before the
+    // new reader starts.
+    virtual void OnReconnected() {}
+    // Where the notice of a returned message goes.
+    virtual void DeliverReturnedMessage(const ResetEvent& event) = 0;
+    // How long one socket call may run before its socket is shut down: one
+    // heartbeat interval, after which the broker itself gives a silent peer
+    // up.
+    Clock::duration StallLimit() const;
+
+    SocketWatchdog Watchdog;
+
+private:
+    PollOutcome PollUnderGate(const timeval& timeout);
+    void StartReader();
+    void Reconnect();
+    void Deliver(const EnvelopePtr& envelope);
+    void HandleMethod(amqp_method_number_t method, amqp_channel_t channel);
+    void LibraryFailure(int status);
+
+    const Texts texts_;
+    WatchedThread Reader;
+    // Notices read during the current poll; reader thread only.
+    std::vector<ResetEvent> Returned;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,23 @@
+#include "messagebus/EnvelopeHeaders.h"
+
+#include "messagebus/AmqpFrames.h"
+#include "messagebus/AmqpPropertiesC.h"
+#include "messagelibrary/AmqpPropertyMapping.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope,
+                                   const std::string& consumerTag) {
+    return HeadersFromAmqp(FromAmqpBasicProperties(envelope.message.properties),
+                           BytesText(envelope.routing_key), consumerTag, envelope.delivery_tag);
+}
+
+std::shared_ptr<GenericMessage> MessageFromEnvelope(const amqp_envelope_t& envelope,
+                                                    const std::string& consumerTag) {
+    const amqp_bytes_t& body = envelope.message.body;
+    return std::make_shared<GenericMessage>(
+        HeadersFromEnvelope(envelope, consumerTag),
+        MessageBody(static_cast<const char*>(body.bytes), body.bytes != nullptr ? body.len : 0));
+}
+
+}  // namespace Korvane::Veldra::MessageBus

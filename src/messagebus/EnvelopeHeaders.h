@@ -1,0 +1,24 @@
+#pragma once
+
+#include <amqp.h>
+
+#include <memory>
+#include <string>
+
+#include "messagelibrary/GenericMessage.h"
+#include "messagelibrary/MessageHeaders.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+// The headers of a delivery: type, content type and routing key by their
+// lengths, the correlation id up to its first zero byte, the timestamp read
+// as milliseconds, "Persistent" from the delivery mode, "ConsumerTag", every
+// entry of the header table, and last "DeliveryTag" from the envelope.
+MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope, const std::string& consumerTag);
+
+// The received message: those headers and a copy of the body, so that it
+// outlives the envelope.
+std::shared_ptr<GenericMessage> MessageFromEnvelope(const amqp_envelope_t& envelope,
+                                                    const std::string& consumerTag);
+
+}  // namespace Korvane::Veldra::MessageBus
