@@ -1,0 +1,484 @@
+// Round trip of a small request answered by a minimal responder, through
+// MessageService and directly on rabbitmq-c, on the private test broker.
+//
+//   tests/integration/broker/broker.sh start /tmp/broker.env
+//   KVVELDRA_BROKER_ENV=/tmp/broker.env build/bench/service_roundtrip_bench
+//
+// Without KVVELDRA_BROKER_ENV the file the test harness writes next to the
+// build's benchmarks (tests/integration/broker/broker.env) is read; without a
+// broker the benchmark says so and does nothing.
+#include <amqp.h>
+#include <amqp_tcp_socket.h>
+#include <benchmark/benchmark.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <cstdio>
+#include <fstream>
+#include <map>
+#include <memory>
+#include <mutex>
+#include <optional>
+#include <stdexcept>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/MessageService.h"
+#include "messagebus/Semaphore.h"
+#include "messagelibrary/RequestMessage.h"
+
+namespace {
+
+namespace Bus = Korvane::Veldra::MessageBus;
+using Clock = std::chrono::steady_clock;
+
+constexpr int kSequentialRoundTrips = 3000;
+constexpr int kPipelineThreads = 4;
+constexpr int kPipelineWindow = 32;  // requests in flight per thread
+constexpr int kPipelinePerThread = 5000;
+constexpr int kReplyTimeoutMs = 5000;
+
+// ---- The broker of the test harness ----
+
+struct BrokerAddress {
+    std::string host, user, password;
+    int port = 0;
+};
+
+std::string DefaultEnvFile() {
+    char exe[4096];
+    const ssize_t length = readlink("/proc/self/exe", exe, sizeof(exe) - 1);
+    if (length <= 0) return std::string();
+    std::string path(exe, static_cast<size_t>(length));
+    path = path.substr(0, path.rfind('/'));  // <build>/bench
+    return path.substr(0, path.rfind('/')) + "/tests/integration/broker/broker.env";
+}
+
+// Reads the KEY='value' lines the harness writes; null when there is no file.
+std::optional<BrokerAddress> LoadBroker(std::string& path) {
+    const char* fromEnv = std::getenv("KVVELDRA_BROKER_ENV");
+    path = fromEnv != nullptr && *fromEnv != '\0' ? fromEnv : DefaultEnvFile();
+    std::ifstream file(path);
+    if (!file) return std::nullopt;
+    std::map<std::string, std::string> values;
+    for (std::string line; std::getline(file, line);) {
+        const auto equals = line.find('=');
+        if (equals == std::string::npos) continue;
+        std::string value = line.substr(equals + 1);
+        if (value.size() >= 2 && value.front() == '\'') value = value.substr(1, value.size() - 2);
+        values[line.substr(0, equals)] = value;
+    }
+    BrokerAddress broker{values["BROKER_HOST"], values["BROKER_USER"], values["BROKER_PASSWORD"],
+                         std::atoi(values["BROKER_AMQP_PORT"].c_str())};
+    if (broker.host.empty() || broker.port == 0) return std::nullopt;
+    return broker;
+}
+
+// ---- Directly on rabbitmq-c ----
+
+void Check(const amqp_rpc_reply_t& reply, const char* step) {
+    if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
+        throw std::runtime_error(std::string("rabbitmq-c failed: ") + step);
+    }
+}
+
+std::string Text(const amqp_bytes_t& bytes) {
+    return std::string(static_cast<const char*>(bytes.bytes), bytes.len);
+}
+
+struct Delivery {
+    std::string correlationId, replyTo;
+};
+
+// One connection with channel 1, used by one thread at a time.
+class RawConnection {
+public:
+    explicit RawConnection(const BrokerAddress& broker) : state_(amqp_new_connection()) {
+        amqp_socket_t* socket = amqp_tcp_socket_new(state_);
+        if (socket == nullptr || amqp_socket_open(socket, broker.host.c_str(), broker.port) != 0) {
+            amqp_destroy_connection(state_);
+            throw std::runtime_error("cannot open a socket to the broker");
+        }
+        Check(amqp_login(state_, "/", 0, 131072, 0, AMQP_SASL_METHOD_PLAIN, broker.user.c_str(),
+                         broker.password.c_str()),
+              "login");
+        amqp_channel_open(state_, 1);
+        Check(amqp_get_rpc_reply(state_), "channel.open");
+    }
+    ~RawConnection() {
+        amqp_channel_close(state_, 1, AMQP_REPLY_SUCCESS);
+        amqp_connection_close(state_, AMQP_REPLY_SUCCESS);
+        amqp_destroy_connection(state_);
+    }
+    RawConnection(const RawConnection&) = delete;
+    RawConnection& operator=(const RawConnection&) = delete;
+
+    // A topic exchange, and an auto-deleted queue bound to it with the key
+    // and consumed without acknowledgements.
+    void Listen(const std::string& exchange, const std::string& queue, const std::string& key) {
+        amqp_exchange_declare(state_, 1, amqp_cstring_bytes(exchange.c_str()),
+                              amqp_cstring_bytes("topic"), 0, 0, 0, 0, amqp_empty_table);
+        Check(amqp_get_rpc_reply(state_), "exchange.declare");
+        amqp_queue_declare(state_, 1, amqp_cstring_bytes(queue.c_str()), 0, 0, 0, 1,
+                           amqp_empty_table);
+        Check(amqp_get_rpc_reply(state_), "queue.declare");
+        amqp_queue_bind(state_, 1, amqp_cstring_bytes(queue.c_str()),
+                        amqp_cstring_bytes(exchange.c_str()), amqp_cstring_bytes(key.c_str()),
+                        amqp_empty_table);
+        Check(amqp_get_rpc_reply(state_), "queue.bind");
+        amqp_basic_consume(state_, 1, amqp_cstring_bytes(queue.c_str()), amqp_empty_bytes, 0, 1, 0,
+                           amqp_empty_table);
+        Check(amqp_get_rpc_reply(state_), "basic.consume");
+    }
+
+    void Publish(const std::string& exchange, const std::string& key,
+                 const std::string& correlationId, const std::string& replyTo) {
+        amqp_basic_properties_t properties{};
+        properties._flags = AMQP_BASIC_CONTENT_TYPE_FLAG | AMQP_BASIC_CORRELATION_ID_FLAG |
+                            AMQP_BASIC_REPLY_TO_FLAG;
+        properties.content_type = amqp_cstring_bytes("application/json");
+        properties.correlation_id = amqp_cstring_bytes(correlationId.c_str());
+        properties.reply_to = amqp_cstring_bytes(replyTo.c_str());
+        if (amqp_basic_publish(state_, 1, amqp_cstring_bytes(exchange.c_str()),
+                               amqp_cstring_bytes(key.c_str()), 0, 0, &properties,
+                               amqp_cstring_bytes("{}")) != 0) {
+            throw std::runtime_error("rabbitmq-c failed: basic.publish");
+        }
+    }
+
+    // The next delivery, or false after the timeout.
+    bool Next(Delivery& out, int timeoutMs) {
+        amqp_maybe_release_buffers(state_);
+        amqp_envelope_t envelope;
+        timeval timeout{timeoutMs / 1000, (timeoutMs % 1000) * 1000};
+        const amqp_rpc_reply_t reply = amqp_consume_message(state_, &envelope, &timeout, 0);
+        if (reply.reply_type == AMQP_RESPONSE_LIBRARY_EXCEPTION &&
+            reply.library_error == AMQP_STATUS_TIMEOUT) {
+            return false;
+        }
+        Check(reply, "consume");
+        out.correlationId = Text(envelope.message.properties.correlation_id);
+        out.replyTo = Text(envelope.message.properties.reply_to);
+        amqp_destroy_envelope(&envelope);
+        return true;
+    }
+
+private:
+    amqp_connection_state_t state_;
+};
+
+// Runs the step until stop is set; a failure is printed and ends the loop, and
+// the waiting side then runs out of time.
+template <typename Step>
+void RunUntil(const std::atomic<bool>& stop, Step step) {
+    try {
+        while (!stop) step();
+    } catch (const std::exception& error) {
+        std::fprintf(stderr, "service_roundtrip_bench: %s\n", error.what());
+    }
+}
+
+// Answers every request on its queue to the request's reply_to key.
+class RawResponder {
+public:
+    RawResponder(const BrokerAddress& broker, const std::string& exchange, const std::string& key)
+        : connection_(broker), exchange_(exchange) {
+        connection_.Listen(exchange, key, key);
+        thread_ = std::thread([this] {
+            Delivery request;
+            RunUntil(stop_, [&] {
+                if (connection_.Next(request, 100)) {
+                    connection_.Publish(exchange_, request.replyTo, request.correlationId, "");
+                }
+            });
+        });
+    }
+    ~RawResponder() {
+        stop_ = true;
+        thread_.join();
+    }
+
+private:
+    RawConnection connection_;
+    const std::string exchange_;
+    std::atomic<bool> stop_{false};
+    std::thread thread_;
+};
+
+// ---- Through MessageService ----
+
+class BenchRequest : public Bus::RequestMessage {
+public:
+    explicit BenchRequest(const std::string& target)
+        : RequestMessage("BenchRequest", "application/json", target) {}
+    Bus::MessageBody Serialize() const override { return Bus::MessageBody(std::string("{}")); }
+};
+
+// Answers every "BenchRequest" with a GenericResponse.
+class ServiceResponder : public Bus::Interfaces::IBroadcastCallback {
+public:
+    explicit ServiceResponder(Bus::MessageService& service) : service_(service) {}
+    void OnMessage(std::shared_ptr<Bus::GenericMessage> message) override {
+        service_.SendResponse(*message);
+    }
+
+private:
+    Bus::MessageService& service_;
+};
+
+std::unique_ptr<Bus::AmqpConnectionManager> MakeManager(const BrokerAddress& broker) {
+    Bus::VeldraConfiguration configuration;
+    configuration.Host = broker.host;
+    configuration.Port = broker.port;
+    configuration.User = broker.user;
+    configuration.Password = broker.password;
+    configuration.ExchangeName = "kvveldra.bench.service";
+    return std::make_unique<Bus::AmqpConnectionManager>(configuration);
+}
+
+Bus::MessageServiceSettings Settings(Bus::AmqpConnectionManager& manager, const char* name) {
+    Bus::MessageServiceSettings settings;
+    settings.Name = name;
+    settings.ConnectionManager = &manager;
+    return settings;
+}
+
+// Client and server each with a manager of their own, as two processes would.
+struct ServiceWorld {
+    explicit ServiceWorld(const BrokerAddress& broker)
+        : serverManager(MakeManager(broker)),
+          clientManager(MakeManager(broker)),
+          server(Settings(*serverManager, "bench_server")),
+          client(Settings(*clientManager, "bench_client")) {
+        server.Subscriber()->RegisterMessageCallback(
+            "BenchRequest", std::make_shared<ServiceResponder>(server), false);
+    }
+    std::unique_ptr<Bus::AmqpConnectionManager> serverManager, clientManager;
+    Bus::MessageService server, client;
+};
+
+// ---- Figures ----
+
+struct Figures {
+    double p50Us = 0, p99Us = 0, perSecond = 0;
+};
+std::map<std::string, Figures> g_figures;
+std::optional<BrokerAddress> g_broker;
+std::unique_ptr<ServiceWorld> g_service;
+const std::string g_tag = std::to_string(getpid());
+
+double Percentile(std::vector<double> values, double fraction) {
+    std::sort(values.begin(), values.end());
+    return values[static_cast<size_t>(fraction * (values.size() - 1))];
+}
+
+// Runs one round trip per iteration, timing each; roundTrip returns false
+// when no response came.
+template <typename RoundTrip>
+void MeasureSequential(benchmark::State& state, const char* name, RoundTrip roundTrip) {
+    std::vector<double> latencies;
+    latencies.reserve(kSequentialRoundTrips);
+    const auto start = Clock::now();
+    for (auto _ : state) {
+        const auto sent = Clock::now();
+        if (!roundTrip()) {
+            state.SkipWithError("no response in time");
+            return;
+        }
+        latencies.push_back(std::chrono::duration<double, std::micro>(Clock::now() - sent).count());
+    }
+    const double seconds = std::chrono::duration<double>(Clock::now() - start).count();
+    Figures& figures = g_figures[name];
+    figures = {Percentile(latencies, 0.5), Percentile(latencies, 0.99), latencies.size() / seconds};
+    state.counters["p50_us"] = figures.p50Us;
+    state.counters["p99_us"] = figures.p99Us;
+    state.counters["round_trips_per_s"] = figures.perSecond;
+}
+
+void BM_RoundTripRaw(benchmark::State& state) {
+    const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.server." + g_tag;
+    const std::string reply = "bench.raw.client." + g_tag;
+    RawResponder responder(*g_broker, exchange, server);
+    RawConnection client(*g_broker);
+    client.Listen(exchange, reply, reply);
+    int next = 0;
+    MeasureSequential(state, "raw", [&] {
+        const std::string id = std::to_string(next++);
+        client.Publish(exchange, server, id, reply);
+        Delivery response;
+        while (client.Next(response, kReplyTimeoutMs)) {
+            if (response.correlationId == id) return true;
+        }
+        return false;
+    });
+}
+
+void BM_RoundTripService(benchmark::State& state) {
+    const std::string target = g_service->server.QueueName();
+    MeasureSequential(state, "service", [&] {
+        BenchRequest request(target);
+        return g_service->client.SendRequest(request, kReplyTimeoutMs) != nullptr;
+    });
+}
+
+// kPipelineThreads senders, each with at most kPipelineWindow requests in
+// flight; a response frees a place in its sender's window. send(thread,
+// index) sends one request; responses call Completed(thread).
+class Pipeline {
+public:
+    Pipeline() : windows_(kPipelineThreads) {
+        for (auto& window : windows_) {
+            for (int i = 0; i < kPipelineWindow; ++i) window.Release();
+        }
+    }
+    template <typename Send>
+    double Run(Send send) {
+        const auto start = Clock::now();
+        std::vector<std::thread> senders;
+        for (int t = 0; t < kPipelineThreads; ++t) {
+            senders.emplace_back([&, t] {
+                try {
+                    for (int i = 0; i < kPipelinePerThread; ++i) {
+                        windows_[t].Acquire(Bus::Semaphore::kInfinite);
+                        send(t, i);
+                    }
+                } catch (const std::exception& error) {
+                    // The missing responses end the run below.
+                    std::fprintf(stderr, "service_roundtrip_bench: %s\n", error.what());
+                }
+            });
+        }
+        for (auto& sender : senders) sender.join();
+        // Every window full again: every response is in.
+        for (auto& window : windows_) {
+            for (int i = 0; i < kPipelineWindow; ++i) {
+                if (!window.Acquire(kReplyTimeoutMs)) return 0;
+            }
+        }
+        const double seconds = std::chrono::duration<double>(Clock::now() - start).count();
+        return kPipelineThreads * kPipelinePerThread / seconds;
+    }
+    void Completed(uint32_t thread) {
+        if (thread < windows_.size()) windows_[thread].Release();
+    }
+
+private:
+    std::vector<Bus::Semaphore> windows_;
+};
+
+void ReportPipeline(benchmark::State& state, const char* name, double perSecond) {
+    if (perSecond == 0) {
+        state.SkipWithError("responses missing");
+        return;
+    }
+    g_figures[name].perSecond = perSecond;
+    state.counters["requests_per_s"] = perSecond;
+    state.SetItemsProcessed(static_cast<int64_t>(kPipelineThreads) * kPipelinePerThread);
+}
+
+void BM_PipelinedRaw(benchmark::State& state) {
+    const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.pserver." + g_tag;
+    const std::string reply = "bench.raw.pclient." + g_tag;
+    for (auto _ : state) {
+        RawResponder responder(*g_broker, exchange, server);
+        RawConnection publisher(*g_broker), consumer(*g_broker);
+        consumer.Listen(exchange, reply, reply);
+        Pipeline pipeline;
+        std::atomic<bool> stop{false};
+        std::thread reader([&] {
+            Delivery response;
+            RunUntil(stop, [&] {
+                if (consumer.Next(response, 100)) {
+                    pipeline.Completed(std::stoul(response.correlationId));
+                }
+            });
+        });
+        std::mutex publishMutex;  // rabbitmq-c connections are not thread-safe
+        const double perSecond = pipeline.Run([&](int thread, int index) {
+            const std::string id = std::to_string(thread) + "-" + std::to_string(index);
+            std::lock_guard<std::mutex> lock(publishMutex);
+            publisher.Publish(exchange, server, id, reply);
+        });
+        stop = true;
+        reader.join();
+        ReportPipeline(state, "raw_pipelined", perSecond);
+    }
+}
+
+// Frees the window of the sender whose number is the state minus one.
+class WindowRelease : public Bus::Interfaces::IResponseCallback {
+public:
+    explicit WindowRelease(Pipeline& pipeline) : pipeline_(pipeline) {}
+    void OnResponse(std::shared_ptr<Bus::GenericMessage>, uint32_t state) override {
+        pipeline_.Completed(state - 1);
+    }
+
+private:
+    Pipeline& pipeline_;
+};
+
+void BM_PipelinedService(benchmark::State& state) {
+    const std::string target = g_service->server.QueueName();
+    for (auto _ : state) {
+        Pipeline pipeline;
+        WindowRelease release(pipeline);
+        g_service->client.SetStateResponseCallback(&release);
+        const double perSecond = pipeline.Run([&](int thread, int) {
+            BenchRequest request(target);
+            g_service->client.SendRequestAsync(request, static_cast<uint32_t>(thread) + 1);
+        });
+        g_service->client.SetStateResponseCallback(nullptr);
+        ReportPipeline(state, "service_pipelined", perSecond);
+    }
+}
+
+BENCHMARK(BM_RoundTripRaw)->Iterations(kSequentialRoundTrips)->UseRealTime();
+BENCHMARK(BM_RoundTripService)->Iterations(kSequentialRoundTrips)->UseRealTime();
+BENCHMARK(BM_PipelinedRaw)->Iterations(1)->UseRealTime();
+BENCHMARK(BM_PipelinedService)->Iterations(1)->UseRealTime();
+
+void PrintRatios() {
+    const Figures raw = g_figures["raw"], service = g_figures["service"];
+    if (raw.p50Us > 0 && service.p50Us > 0) {
+        std::printf("round trip: service/raw p50 %.2fx, p99 %.2fx, round trips/s %.2fx\n",
+                    service.p50Us / raw.p50Us, service.p99Us / raw.p99Us,
+                    service.perSecond / raw.perSecond);
+    }
+    const double rawPipelined = g_figures["raw_pipelined"].perSecond;
+    const double servicePipelined = g_figures["service_pipelined"].perSecond;
+    if (rawPipelined > 0 && servicePipelined > 0) {
+        std::printf("pipelined: service/raw requests/s %.2fx\n", servicePipelined / rawPipelined);
+    }
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    std::string envFile;
+    g_broker = LoadBroker(envFile);
+    if (!g_broker) {
+        std::printf(
+            "service_roundtrip_bench: skipped, no test broker described in %s (start one with "
+            "tests/integration/broker/broker.sh start FILE and set KVVELDRA_BROKER_ENV=FILE)\n",
+            envFile.c_str());
+        return 0;
+    }
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
+    try {
+        g_service = std::make_unique<ServiceWorld>(*g_broker);
+    } catch (const std::exception& error) {
+        std::fprintf(stderr, "service_roundtrip_bench: no services on %s:%d: %s\n",
+                     g_broker->host.c_str(), g_broker->port, error.what());
+        return 1;
+    }
+    benchmark::RunSpecifiedBenchmarks();
+    g_service.reset();
+    PrintRatios();
+    benchmark::Shutdown();
+    return 0;
+}

@@ -1,0 +1,26 @@
+#include <utility>
+
+#include "messagebus/MessageService.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+void MessageService::MessageServiceResponseCallback::OnResponse(
+    std::shared_ptr<GenericMessage> message, uint32_t state) {
+    Service->RouteResponse(message, state);
+}
+
+void MessageService::MessageServiceRegisterBroadcastCallback::RegisterBroadcast(
+    const std::string& messageName, std::shared_ptr<Interfaces::IBroadcastCallback> callback) {
+    if (messageName.empty()) return;
+    // Bound, then registered: a message of that name that arrives in between
+    // takes the default path.
+    Service->Subscriber()->Bind({messageName});
+    Service->Subscriber()->RegisterMessageCallback(messageName, std::move(callback), false);
+}
+
+void MessageService::MessageServiceBroadcastCallback::OnMessage(
+    std::shared_ptr<GenericMessage> message) {
+    Response->OnResponse(std::move(message), 0);
+}
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,113 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <vector>
+
+#include "messagebus/CorrelationPurge.h"
+#include "messagebus/MessageHandlerPool.h"
+#include "messagebus/MessageSubscriberBuilder.h"
+#include "messagebus/ResetEvent.h"
+#include "messagebus/SubscriberCallbackInfo.h"
+#include "utilities/tracelogging/TracePoint.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+class AmqpConnectionManager;
+class AmqpConsumer;
+
+// The receive half of a message service: consumers on one queue, and the
+// decision of who gets each incoming message. In this order: a synchronous
+// caller waiting for the correlation id, a one-shot callback for the
+// correlation id, the callback registered for the message name, the default
+// callback, else the unhandled path. Correlation callbacks whose response
+// never came are purged as messages arrive.
+class MessageSubscriber {
+public:
+    // Builds the consumers, binds [QueueName, "#"] when BindAll is set and
+    // starts consuming when AutoStart is set.
+    explicit MessageSubscriber(const MessageSubscriberBuilder& builder);
+    explicit MessageSubscriber(const std::string& queueName);
+    // Stops consuming, ends the handler threads, then the consumers. Must not
+    // run inside one of its own callbacks.
+    ~MessageSubscriber();
+    MessageSubscriber(const MessageSubscriber&) = delete;
+    MessageSubscriber& operator=(const MessageSubscriber&) = delete;
+
+    // On every consumer. The binding key is "Veldra" and ".<key>" for each key.
+    void Bind(const std::vector<std::string>& keys);
+    void Unbind(const std::vector<std::string>& keys);
+    // On every consumer; a second start without a stop between does nothing.
+    void StartConsuming();
+    void StopConsuming();
+    // On the first consumer with that tag.
+    void Ack(const std::string& consumerTag, uint64_t deliveryTag);
+    void Requeue(const std::string& consumerTag, uint64_t deliveryTag);
+
+    // Inserts, or replaces callback, state and time. An empty id does nothing.
+    void RegisterCorrelationCallback(const std::string& correlationId,
+                                     std::shared_ptr<Interfaces::IResponseCallback> callback,
+                                     uint32_t state);
+    // Inserts; an existing name keeps its entry and is logged. An empty name
+    // does nothing.
+    void RegisterMessageCallback(const std::string& messageName,
+                                 std::shared_ptr<Interfaces::IBroadcastCallback> callback,
+                                 bool manualAck);
+    // Registers without manual acknowledgement, then binds [messageName].
+    void RegisterAndBind(const std::string& messageName,
+                         std::shared_ptr<Interfaces::IBroadcastCallback> callback);
+    void UnregisterMessageCallback(const std::string& messageName);
+
+    // Keeps the logger, reads its "UnhandledMessage" point and hands it to
+    // every consumer. Null is allowed.
+    void SetTraceLogger(std::shared_ptr<Interfaces::ITraceLogger> traceLogger);
+
+    // ---- What the consumers' receive callbacks call, on their threads ----
+    void MessageReceived(std::shared_ptr<GenericMessage> message);
+    // A returned publish: fails its synchronous waiter, or drops its
+    // correlation callback.
+    void PublishFailed(const ResetEvent& event);
+
+    // ---- The callback maps, for the message service ----
+    const std::shared_ptr<SynchCallbackMap>& SynchCallbacks() const { return synchCallbacks_; }
+    const std::shared_ptr<CorrIdCallbackMap>& CorrIdCallbacks() const { return corrIdCallbacks_; }
+    const std::shared_ptr<NameCallbackMap>& NameCallbacks() const { return nameCallbacks_; }
+
+    const std::string& QueueName() const { return queueName_; }
+    const std::vector<std::shared_ptr<AmqpConsumer>>& Consumers() const { return consumers_; }
+
+private:
+    void HandleMessage(const std::shared_ptr<GenericMessage>& message);
+    void HandleUnhandled(const GenericMessage& message);
+    void Purge();
+    // The logger and its "UnhandledMessage" point, as one consistent pair.
+    std::shared_ptr<Interfaces::ITraceLogger> Logger(TracePoint& unhandledPoint);
+    void LogError(const std::string& text);
+    AmqpConsumer* ConsumerWithTag(const std::string& consumerTag) const;
+    void Shutdown();
+
+    // ---- State ----
+    AmqpConnectionManager* const connectionManager_;
+    std::vector<std::shared_ptr<AmqpConsumer>> consumers_;
+    const std::shared_ptr<NameCallbackMap> nameCallbacks_;
+    const std::shared_ptr<CorrIdCallbackMap> corrIdCallbacks_;
+    const std::shared_ptr<SynchCallbackMap> synchCallbacks_;
+    const std::string queueName_;
+    const bool manualAck_;
+    std::shared_ptr<Interfaces::ITraceLogger> traceLogger_;
+    TracePoint unhandledPoint_;
+    std::unique_ptr<MessageHandlerPool> handlerPool_;
+    PurgeSchedule lastPurge_;
+    const int32_t callbackMaxAgeMs_;
+    const std::shared_ptr<Interfaces::IBroadcastCallback> defaultCallback_;
+
+    // Guards traceLogger_ and unhandledPoint_.
+    std::mutex loggerMutex_;
+    // Guards consumingCount_: how many consumers have been started.
+    std::mutex startMutex_;
+    size_t consumingCount_ = 0;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

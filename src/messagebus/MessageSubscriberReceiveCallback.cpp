@@ -1,0 +1,17 @@
+#include "messagebus/MessageSubscriberReceiveCallback.h"
+
+#include <utility>
+
+#include "messagebus/MessageSubscriber.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+void MessageSubscriberReceiveCallback::MessageReceived(std::shared_ptr<GenericMessage> message) {
+    Subscriber->MessageReceived(std::move(message));
+}
+
+void MessageSubscriberReceiveCallback::PublishFailed(const ResetEvent& event) {
+    Subscriber->PublishFailed(event);
+}
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <memory>
+
+#include "messagebus/interfaces/IMessageSubscriberReceiveCallback.h"
+
+namespace Korvane::Veldra::MessageBus {
+
+class MessageSubscriber;
+
+// What each consumer of a subscriber hands its messages and return notices
+// to; it passes them on to the subscriber, which outlives its consumers.
+class MessageSubscriberReceiveCallback : public Interfaces::IMessageSubscriberReceiveCallback {
+public:
+    explicit MessageSubscriberReceiveCallback(MessageSubscriber* subscriber)
+        : Subscriber(subscriber) {}
+
+    void MessageReceived(std::shared_ptr<GenericMessage> message) override;
+    void PublishFailed(const ResetEvent& event) override;
+
+private:
+    MessageSubscriber* const Subscriber;
+};
+
+}  // namespace Korvane::Veldra::MessageBus

@@ -1,0 +1,145 @@
+#include <gtest/gtest.h>
+
+#include <future>
+#include <memory>
+#include <string>
+
+#include "ServiceTestSupport.h"
+#include "errors/AmqpException.h"
+#include "errors/ErrorTable.h"
+#include "messagebus/CatchVeldra.h"
+#include "messagelibrary/GenericResponse.h"
+
+namespace Korvane::Veldra::Testing {
+namespace {
+
+constexpr milliseconds kArrival(20000);
+constexpr uint32_t kAnswerMs = 20000;
+
+using ServiceRequest = ServiceFixture;
+
+TEST_F(ServiceRequest, SynchronousRequestIsAnsweredUnlessItAsksForNoResponse) {
+    struct Case {
+        const char* what;
+        bool routed, expecting, fail, answered;
+    };
+    const Case cases[] = {
+        {"request", false, false, false, true},
+        {"failing request", false, false, true, true},
+        {"routed, expecting a response", true, true, false, true},
+        {"routed", true, false, false, false},
+    };
+    responder->Open();
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.what);
+        TestRouted routed("EchoRouted", server.QueueName());
+        TestRequest request("EchoRequest", server.QueueName());
+        MessageBus::MessageBase& message =
+            c.routed ? static_cast<MessageBus::MessageBase&>(routed) : request;
+        if (c.fail) message.SetHeader("Fail", "yes");
+
+        const MessagePtr response = c.expecting
+                                        ? client.SendRequestExpectingResponse(message, kAnswerMs)
+                                        : client.SendRequest(message, c.answered ? kAnswerMs : 300);
+
+        const auto received = responder->received.WaitFor(message.CorrelationId(), kArrival);
+        ASSERT_TRUE(received.has_value());
+        EXPECT_EQ(received->first->ReplyTo(), client.QueueName());
+        EXPECT_EQ(received->first->Origin(), client.Name());
+        EXPECT_EQ(client.Subscriber()->SynchCallbacks()->Size(), 0u);
+        if (!c.answered) {
+            EXPECT_EQ(response, nullptr);
+            EXPECT_TRUE(clientLog->WaitFor(
+                "ERROR Service did not respond | " + message.RoutingKey(), kArrival));
+            continue;
+        }
+        ASSERT_NE(response, nullptr);
+        EXPECT_EQ(response->CorrelationId(), message.CorrelationId());
+        const MessageBus::GenericResponse decoded(response->Headers(), response->Body());
+        EXPECT_EQ(decoded.RequestName(), message.MessageType());
+        EXPECT_EQ(response->GetError().info, c.fail ? "failed on request" : "");
+    }
+}
+
+TEST_F(ServiceRequest, LateReplyGoesOnAsAnOrdinaryMessage) {
+    TestRequest request("EchoRequest", server.QueueName());
+    EXPECT_EQ(client.SendRequest(request, 300), nullptr);
+    EXPECT_TRUE(
+        clientLog->WaitFor("ERROR Service did not respond | " + request.RoutingKey(), kArrival));
+    responder->Open();
+    EXPECT_TRUE(unclaimed->WaitFor(request.CorrelationId(), kArrival));
+}
+
+TEST_F(ServiceRequest, SecondRequestWithTheSameCorrelationIdWaitsInVainAndEndsTheFirstWait) {
+    TestRequest first("EchoRequest", server.QueueName());
+    auto firstResult =
+        std::async(std::launch::async, [&] { return client.SendRequest(first, 3000); });
+    // Once the server holds the first request, its waiter is registered.
+    const std::string id = first.CorrelationId();
+    ASSERT_TRUE(responder->received.WaitFor(id, kArrival));
+
+    TestRequest second("EchoRequest", server.QueueName());
+    second.SetCorrelationId(id);
+    second.SetHeader("Fail", "yes");  // tells the two answers apart
+    EXPECT_EQ(client.SendRequest(second, 300), nullptr);
+    // The second's clean-up took the first's entry with it.
+    EXPECT_EQ(client.Subscriber()->SynchCallbacks()->Size(), 0u);
+
+    responder->Open();
+    EXPECT_EQ(firstResult.get(), nullptr);
+    // Both answers went on as ordinary messages.
+    for (const bool failed : {false, true}) {
+        EXPECT_TRUE(unclaimed->messages.WaitFor(
+            [&](const auto& e) {
+                return e.first->CorrelationId() == id && e.first->HasError() == failed;
+            },
+            kArrival));
+    }
+}
+
+TEST_F(ServiceRequest, MandatoryRequestToAMissingServiceFailsWithTheReturnNotice) {
+    TestRequest request("EchoRequest", UniqueQueueName("svc_missing"));
+    const auto error =
+        MessageBus::Testing::CatchVeldra([&] { client.SendRequest(request, kAnswerMs, true); });
+    ASSERT_TRUE(error.has_value());
+    EXPECT_EQ(error->Code(), MessageBus::FindErrorRow("Veldra.AMQPErrorDequeueingMessage")->code);
+    EXPECT_EQ(std::string(error->what()),
+              "Publish failed:  The message with mandatory routing could not be delivered. "
+              "Message type: EchoRequest, correlation id: " +
+                  request.CorrelationId());
+    EXPECT_EQ(client.Subscriber()->SynchCallbacks()->Size(), 0u);
+}
+
+TEST_F(ServiceRequest, ServiceReportsWhatItCannotDo) {
+    EXPECT_THROWS_VELDRA(server.GetTraceLogger(), -251004,
+                         "InvalidOperationException: No TraceLogger Set");
+    InboxCallback named;
+    client.RegisterResponseCallback("SomeResponse", &named);
+    client.RegisterResponseCallback("SomeResponse", &named);
+    client.UnregisterResponseCallback("Missing");
+    // A response with no correlation callback, no name callback and no default.
+    responder->Open();
+    client.SetDefaultResponseCallback(nullptr);
+    TestRequest request("EchoRequest", server.QueueName());
+    client.Publish(request);
+    for (const char* line : {"ERROR Failed to add register message name callback | SomeResponse",
+                             "ERROR Failed to remove register message name callback | Missing",
+                             "ERROR No callback registered for response | GenericResponse"}) {
+        EXPECT_TRUE(clientLog->WaitFor(line, kArrival)) << line;
+    }
+
+    // A failed routed message that wants no response is only logged.
+    const auto serverLog = std::make_shared<MessageBus::Testing::RecordingTraceLogger>();
+    server.SetTraceLogger(serverLog);
+    TestRouted routed("EchoRouted", server.QueueName());
+    routed.SetHeader("Fail", "yes");
+    client.SendRouted(routed, true);
+    EXPECT_TRUE(
+        serverLog->WaitFor("ERROR Routed Message had error but response was ignored | "
+                           "EchoRouted from " +
+                               client.Name() + " | Error: Veldra.Exception: failed on request",
+                           kArrival));
+}
+
+}  // namespace
+}  // namespace Korvane::Veldra::Testing
