@@ -1,9 +1,16 @@
 #include "messagebus/AmqpReplyText.h"
 
+#include <cstring>
+
 namespace Korvane::Veldra::MessageBus {
 
 std::string AmqpReplyText(const amqp_rpc_reply_t& reply) {
-    switch (static_cast<int>(reply.reply_type)) {
+    // The reply type is read as a plain number: a value outside the enumeration
+    // (which the last case reports) must not be loaded as the enumeration.
+    int type = 0;
+    static_assert(sizeof type == sizeof reply.reply_type);
+    std::memcpy(&type, &reply.reply_type, sizeof type);
+    switch (type) {
         case AMQP_RESPONSE_NONE:
             return "No AMQP Response";
         case AMQP_RESPONSE_NORMAL:
@@ -14,8 +21,7 @@ std::string AmqpReplyText(const amqp_rpc_reply_t& reply) {
         case AMQP_RESPONSE_SERVER_EXCEPTION:
             return "AMQP Server Exception. Method Id: " + std::to_string(reply.reply.id);
         default:
-            return "Unknown AMQP reply type. Value: " +
-                   std::to_string(static_cast<int>(reply.reply_type));
+            return "Unknown AMQP reply type. Value: " + std::to_string(type);
     }
 }
 
