@@ -1,6 +1,7 @@
 #include "errors/Errors.h"
 
 #include "errors/ErrorCodeRegistry.h"
+#include "errors/ErrorCodes.h"
 #include "errors/ErrorTable.h"
 #include "errors/MessageInserts.h"
 #include "errors/VeldraException.h"
@@ -11,11 +12,13 @@ using MessageBus::ErrorCodeRegistry;
 using MessageBus::VeldraException;
 
 void Errors::RequireInitialized() const {
-    if (!initialized_) throw new VeldraException(-251004, "Errors is not initialized");
+    if (!initialized_)
+        throw new VeldraException(ErrorCodes::kException, "Errors is not initialized");
 }
 
 void Errors::initialize() {
-    if (initialized_) throw new VeldraException(-251004, "Errors class is already initialized.");
+    if (initialized_)
+        throw new VeldraException(ErrorCodes::kException, "Errors class is already initialized.");
     std::size_t count = 0;
     const MessageBus::ErrorRow* rows = MessageBus::ErrorRows(count);
     auto& registry = ErrorCodeRegistry::Instance();
@@ -32,7 +35,7 @@ void Errors::initialize() {
 int32_t Errors::codeForName(const std::string& fullName) const {
     RequireInitialized();
     const auto found = codes_.find(fullName);
-    return found == codes_.end() ? -251000 : found->second;
+    return found == codes_.end() ? ErrorCodes::kInternalServiceError : found->second;
 }
 
 bool Errors::nameForCode(int32_t code, std::string& fullName) const {

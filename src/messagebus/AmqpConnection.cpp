@@ -13,7 +13,7 @@
 #include <vector>
 
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpReplyText.h"
 #include "messagebus/CaCertificate.h"
 #include "messagebus/TlsSocketRules.h"
@@ -122,7 +122,7 @@ void AmqpConnection::Connect() {
     ControlGateGuard gate(Gate);
     OwnedState state(amqp_new_connection());
     if (!state) {
-        throw AmqpException(AmqpErrorCodes::kOpeningTCPConnection, "No TCP connection.", 0);
+        throw AmqpException(ErrorCodes::kOpeningTCPConnection, "No TCP connection.", 0);
     }
     amqp_socket_t* socket = NewSocket(state.get());
     const int status = OpenSocket(socket);
@@ -131,7 +131,7 @@ void AmqpConnection::Connect() {
     BoundSilentPeer(state.get());
     CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
                           User.c_str(), Password.c_str()),
-               AmqpErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
+               ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
 
     // Nobody else can be using the replaced state: every call takes the gate.
     if (Connection != nullptr) amqp_destroy_connection(Connection);
@@ -150,13 +150,13 @@ amqp_socket_t* AmqpConnection::NewSocket(amqp_connection_state_t state) {
     if (!UseTls) {
         amqp_socket_t* socket = amqp_tcp_socket_new(state);
         if (socket == nullptr) {
-            throw AmqpException(AmqpErrorCodes::kCreatingTCPSocket, "Error creating TCP socket.");
+            throw AmqpException(ErrorCodes::kCreatingTCPSocket, "Error creating TCP socket.");
         }
         return socket;
     }
     amqp_socket_t* socket = amqp_ssl_socket_new(state);
     if (socket == nullptr) {
-        throw AmqpException(AmqpErrorCodes::kCreatingSSLSocket, "Error creating SSL/TLS socket.");
+        throw AmqpException(ErrorCodes::kCreatingSSLSocket, "Error creating SSL/TLS socket.");
     }
     amqp_ssl_socket_set_verify_peer(socket, 1);
     amqp_ssl_socket_set_verify_hostname(socket, VerifiesHostName(Host) ? 1 : 0);
@@ -164,7 +164,7 @@ amqp_socket_t* AmqpConnection::NewSocket(amqp_connection_state_t state) {
     const int status = amqp_ssl_socket_set_cacert(socket, caPath.c_str());
     if (status != AMQP_STATUS_OK) {
         throw AmqpException(
-            AmqpErrorCodes::kSettingCACertificate,
+            ErrorCodes::kSettingCACertificate,
             "Error setting CA certificate: " + caPath + ". AMQP status " + std::to_string(status),
             status);
     }
@@ -212,7 +212,7 @@ void AmqpConnection::ThrowOpenFailure(int status) const {
     const std::string statusText = std::to_string(status);
     if (status != AMQP_STATUS_SSL_PEER_VERIFY_FAILED) {
         throw AmqpException(
-            AmqpErrorCodes::kOpeningSocket,
+            ErrorCodes::kOpeningSocket,
             "Error opening TCP socket. RabbitMQ client (rabbitmq-c) status code: " + statusText,
             status);
     }
@@ -220,18 +220,18 @@ void AmqpConnection::ThrowOpenFailure(int status) const {
     // CA did not sign.
     const CaCertificate certificate(ResolveCaCertificatePath(CertPath));
     if (certificate.Get() == nullptr) {
-        throw VeldraException(AmqpErrorCodes::kFailedToLoadCertificate,
+        throw VeldraException(ErrorCodes::kFailedToLoadCertificate,
                               "Auto cert not initialized.");
     }
     if (certificate.IsExpiredAt(std::time(nullptr))) {
-        throw AmqpException(AmqpErrorCodes::kCertificateExpired,
+        throw AmqpException(ErrorCodes::kCertificateExpired,
                             "Certificate expired or system time incorrect. RabbitMQ client "
                             "(rabbitmq-c) status code: " +
                                 statusText,
                             status);
     }
     throw AmqpException(
-        AmqpErrorCodes::kPeerVerifyFailed,
+        ErrorCodes::kPeerVerifyFailed,
         "SSL peer verification failed. RabbitMQ client (rabbitmq-c) status code: " + statusText,
         status);
 }
@@ -241,7 +241,7 @@ std::shared_ptr<AmqpChannel> AmqpConnection::CreateChannel() {
     std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
     const uint16_t id = LowestFreeChannelId(Channels);
     if (id == 0) {
-        throw AmqpException(AmqpErrorCodes::kOpeningChannel,
+        throw AmqpException(ErrorCodes::kOpeningChannel,
                             "Error opening AMQP channel. No free channel number.");
     }
     OpenChannel(id);
@@ -281,9 +281,9 @@ bool AmqpConnection::IsConnected() const {
 void AmqpConnection::OpenChannel(uint16_t channelId) {
     const std::string context = "Error opening AMQP channel. ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kOpeningChannel, context);
+    RequireConnection(ErrorCodes::kOpeningChannel, context);
     amqp_channel_open(Connection, channelId);
-    CheckReply(LastReply(), AmqpErrorCodes::kOpeningChannel, context);
+    CheckReply(LastReply(), ErrorCodes::kOpeningChannel, context);
 }
 
 void AmqpConnection::DeclareExchange(uint16_t channelId) {
@@ -291,10 +291,10 @@ void AmqpConnection::DeclareExchange(uint16_t channelId) {
         "Error declaring topic exchange. Channel ID: " + std::to_string(channelId) +
         ". Exchange name: \"" + ExchangeName + "\". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kDeclaringExchange, context);
+    RequireConnection(ErrorCodes::kDeclaringExchange, context);
     amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
                           amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
-    CheckReply(LastReply(), AmqpErrorCodes::kDeclaringExchange, context);
+    CheckReply(LastReply(), ErrorCodes::kDeclaringExchange, context);
 }
 
 void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t prefetchCount,
@@ -305,9 +305,9 @@ void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t 
         ". Prefetch count: " + std::to_string(prefetchCount) +
         ". Global: " + (global ? "true" : "false") + ". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kSettingQoS, context);
+    RequireConnection(ErrorCodes::kSettingQoS, context);
     amqp_basic_qos(Connection, channelId, prefetchSize, prefetchCount, global ? 1 : 0);
-    CheckReply(LastReply(), AmqpErrorCodes::kSettingQoS, context);
+    CheckReply(LastReply(), ErrorCodes::kSettingQoS, context);
 }
 
 void AmqpConnection::CloseConnection() {
@@ -318,9 +318,9 @@ void AmqpConnection::CloseConnection() {
     const int status = amqp_destroy_connection(Connection);
     Connection = nullptr;
     Socket = nullptr;
-    CheckReply(reply, AmqpErrorCodes::kClosingTCPConnection, "Error closing connection. ");
+    CheckReply(reply, ErrorCodes::kClosingTCPConnection, "Error closing connection. ");
     if (status != AMQP_STATUS_OK) {
-        throw AmqpException(AmqpErrorCodes::kEndingTCPConnection,
+        throw AmqpException(ErrorCodes::kEndingTCPConnection,
                             "Error ending connection.  AMQP status: " + std::to_string(status),
                             status);
     }

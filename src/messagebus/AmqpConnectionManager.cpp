@@ -3,7 +3,7 @@
 #include <utility>
 
 #include "messagebus/AmqpConsumerConnection.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpPublisherConnection.h"
 #include "messagebus/BusConfigurations.h"
 
@@ -12,7 +12,7 @@ namespace {
 
 // The number of a channel handed in by a caller; a null channel is refused.
 uint16_t IdOf(const std::shared_ptr<AmqpChannel>& channel) {
-    if (!channel) throw VeldraException(AmqpErrorCodes::kException, "No AMQP channel given.");
+    if (!channel) throw VeldraException(ErrorCodes::kException, "No AMQP channel given.");
     return channel->Id;
 }
 

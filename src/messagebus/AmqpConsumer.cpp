@@ -4,7 +4,7 @@
 #include <utility>
 
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/EnvelopeHeaders.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -22,7 +22,7 @@ VeldraException AsVeldraException(const std::exception& error) {
     if (const auto* veldra = dynamic_cast<const VeldraException*>(&error)) {
         return VeldraException(veldra->Code(), veldra->what());
     }
-    return VeldraException(AmqpErrorCodes::kException, error.what());
+    return VeldraException(ErrorCodes::kException, error.what());
 }
 
 }  // namespace

@@ -5,7 +5,7 @@
 #include <thread>
 #include <utility>
 
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpFrames.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -104,7 +104,7 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
                                 ". Exclusive: " + Flag(exclusive) +
                                 ". Auto Delete: " + Flag(autoDelete) + ". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kDeclaringQueue, context);
+    RequireConnection(ErrorCodes::kDeclaringQueue, context);
     amqp_queue_declare_ok_t* declared = nullptr;
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
@@ -112,9 +112,9 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
             amqp_queue_declare(Connection, channelId, TextBytes(queueName), 0, durable ? 1 : 0,
                                exclusive ? 1 : 0, autoDelete ? 1 : 0, amqp_empty_table);
     }
-    CheckReply(LastReply(), AmqpErrorCodes::kDeclaringQueue, context);
+    CheckReply(LastReply(), ErrorCodes::kDeclaringQueue, context);
     if (declared == nullptr || declared->queue.len == 0) {
-        throw AmqpException(AmqpErrorCodes::kObtainingQueueName, "Error obtaining queue name.");
+        throw AmqpException(ErrorCodes::kObtainingQueueName, "Error obtaining queue name.");
     }
 }
 
@@ -128,20 +128,20 @@ void AmqpConsumerConnection::BindAndConsume(uint16_t channelId, const std::strin
         "Error performing basic consume. Channel ID: " + ChannelText(channelId) +
         ". Queue name: \"" + queueName + "\". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kBindingQueue, bindContext);
+    RequireConnection(ErrorCodes::kBindingQueue, bindContext);
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_queue_bind(Connection, channelId, TextBytes(queueName),
                         amqp_cstring_bytes(ExchangeName.c_str()), TextBytes(key), amqp_empty_table);
     }
-    CheckReply(LastReply(), AmqpErrorCodes::kBindingQueue, bindContext);
+    CheckReply(LastReply(), ErrorCodes::kBindingQueue, bindContext);
     {
         // The broker names the consumer; its tag is not kept.
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_basic_consume(Connection, channelId, TextBytes(queueName), amqp_empty_bytes, 0,
                            noAck ? 1 : 0, 0, amqp_empty_table);
     }
-    CheckReply(LastReply(), AmqpErrorCodes::kPerformingBasicConsume, consumeContext);
+    CheckReply(LastReply(), ErrorCodes::kPerformingBasicConsume, consumeContext);
 }
 
 void AmqpConsumerConnection::Unbind(uint16_t channelId, const std::string& queueName,
@@ -151,14 +151,14 @@ void AmqpConsumerConnection::Unbind(uint16_t channelId, const std::string& queue
                                 ". Queue name: \"" + queueName + "\". Exchange name: \"" +
                                 ExchangeName + "\". Binding key: \"" + key + "\". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(AmqpErrorCodes::kUnbindingQueue, context);
+    RequireConnection(ErrorCodes::kUnbindingQueue, context);
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_queue_unbind(Connection, channelId, TextBytes(queueName),
                           amqp_cstring_bytes(ExchangeName.c_str()), TextBytes(key),
                           amqp_empty_table);
     }
-    CheckReply(LastReply(), AmqpErrorCodes::kUnbindingQueue, context);
+    CheckReply(LastReply(), ErrorCodes::kUnbindingQueue, context);
 }
 
 void AmqpConsumerConnection::Ack(uint16_t channelId, uint64_t deliveryTag) {

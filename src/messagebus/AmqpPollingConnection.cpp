@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpFrames.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -182,7 +182,7 @@ void AmqpPollingConnection::ReconnectLoop() {
         }
     } catch (const std::exception& error) {
         // The wait itself failed: nothing here can go on.
-        ReportError(VeldraException(AmqpErrorCodes::kException, error.what()));
+        ReportError(VeldraException(ErrorCodes::kException, error.what()));
     }
 }
 
@@ -198,7 +198,7 @@ void AmqpPollingConnection::Reconnect() {
     } catch (const VeldraException& error) {
         if (!StopRequested) ReportError(error);
     } catch (const std::exception& error) {
-        if (!StopRequested) ReportError(VeldraException(AmqpErrorCodes::kException, error.what()));
+        if (!StopRequested) ReportError(VeldraException(ErrorCodes::kException, error.what()));
     }
 }
 

@@ -4,7 +4,7 @@
 #include <utility>
 
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpFrames.h"
 #include "messagebus/AmqpPropertiesC.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
@@ -97,7 +97,7 @@ void AmqpPublisherConnection::Publish(uint16_t channelId, const MessageHeaders& 
         }
     }
     if (status != AMQP_STATUS_OK) {
-        throw AmqpException(AmqpErrorCodes::kPublishingMessage,
+        throw AmqpException(ErrorCodes::kPublishingMessage,
                             "Error publishing message. AMQP status: " + std::to_string(status),
                             status);
     }

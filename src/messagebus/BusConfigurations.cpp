@@ -5,6 +5,7 @@
 #include <iterator>
 #include <mutex>
 
+#include "errors/ErrorCodes.h"
 #include "errors/VeldraException.h"
 #include "messagelibrary/json/JsonParser.h"
 #include "utilities/Paths.h"
@@ -12,10 +13,10 @@
 namespace Korvane::Veldra::MessageBus {
 namespace {
 
-constexpr int32_t kFailedToParse = -251005;
-constexpr int32_t kNoConfigurations = -251011;
-constexpr int32_t kDirectoryNotFound = -251012;
-constexpr int32_t kDuplicateId = -251013;
+using ErrorCodes::kFailedToParse;
+constexpr int32_t kNoConfigurations = ErrorCodes::kNoVeldraConfigurations;
+constexpr int32_t kDirectoryNotFound = ErrorCodes::kConfigDirectoryNotFound;
+constexpr int32_t kDuplicateId = ErrorCodes::kDuplicateConfigurationId;
 constexpr auto kRefreshInterval = std::chrono::seconds(5);
 
 std::string ToLower(std::string text) {
@@ -70,9 +71,9 @@ BusConfigurations::ScannedFiles BusConfigurations::ScanDirectory() const {
     std::filesystem::directory_iterator entry;
     if (!error) entry = std::filesystem::directory_iterator(directory_, error);
     if (error) {
-        throw VeldraException(kDirectoryNotFound, "Veldra configurations directory not found: " +
-                                                      directory_.string() +
-                                                      ". Error: " + error.message());
+        throw VeldraException(kDirectoryNotFound,
+                              "Veldra configurations directory not found: " + directory_.string() +
+                                  ". Error: " + error.message());
     }
     ScannedFiles files;
     for (; entry != std::filesystem::directory_iterator(); entry.increment(error)) {
@@ -102,14 +103,14 @@ void BusConfigurations::Load() {
         const std::string id = ToLower(entry.Configuration.Id.value_or(""));
         if (entry.Configuration.Id) entry.Configuration.Id = id;
         if (!loaded.emplace(id, std::move(entry)).second) {
-            throw VeldraException(kDuplicateId, "Duplicate id '" + id +
-                                                    "' in Veldra configuration file '" +
-                                                    file.first + "'.");
+            throw VeldraException(
+                kDuplicateId,
+                "Duplicate id '" + id + "' in Veldra configuration file '" + file.first + "'.");
         }
     }
     if (loaded.empty()) {
-        throw VeldraException(kNoConfigurations,
-                              "No Veldra configurations found in directory: " + directory_.string());
+        throw VeldraException(kNoConfigurations, "No Veldra configurations found in directory: " +
+                                                     directory_.string());
     }
     entries_.swap(loaded);
     fileTimes_ = TimesOf(files);
@@ -158,7 +159,8 @@ void BusConfigurations::Initialize(const std::string& configurationId, bool allo
     std::lock_guard<std::recursive_mutex> lock(store.mutex);
     if (store.instance) {
         throw new VeldraException(
-            -251010, "Attempt to reinitialize Message Bus with multiple configurations.");
+            ErrorCodes::kMultipleInitializations,
+            "Attempt to reinitialize Message Bus with multiple configurations.");
     }
     auto instance =
         std::make_unique<BusConfigurations>(ProcessDirectory(), configurationId, allowFallback);

@@ -7,7 +7,7 @@
 #include <cctype>
 
 #include "errors/VeldraException.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -36,7 +36,7 @@ std::optional<std::time_t> TimeOf(const ASN1_TIME* time) {
         ERR_error_string_n(code, line, sizeof line);
         text += "\n OpenSSL error " + std::to_string(code) + ": " + line;
     }
-    throw VeldraException(AmqpErrorCodes::kFailedToLoadCertificate, text);
+    throw VeldraException(ErrorCodes::kFailedToLoadCertificate, text);
 }
 
 }  // namespace

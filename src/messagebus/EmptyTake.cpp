@@ -1,13 +1,13 @@
 #include "messagebus/EmptyTake.h"
 
 #include "errors/VeldraException.h"
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 
 void ThrowEmptyTake(bool closed, const std::string& errorText) {
-    if (closed) throw VeldraException(BusErrorCodes::kEndOfStream, "End Of Stream.");
-    throw VeldraException(BusErrorCodes::kQueueEmpty, errorText);
+    if (closed) throw VeldraException(ErrorCodes::kEndOfStream, "End Of Stream.");
+    throw VeldraException(ErrorCodes::kQueueEmpty, errorText);
 }
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 
@@ -39,7 +39,7 @@ void MessageHandlerPool::Run() {
         } catch (const VeldraException& error) {
             // Normally the queue is closed and drained; a failed wait ends
             // the thread too, as waiting again would fail the same way.
-            if (error.Code() != BusErrorCodes::kEndOfStream) {
+            if (error.Code() != ErrorCodes::kEndOfStream) {
                 Report(std::string("Caught exception in message handler thread: ") + error.what());
             }
             return;

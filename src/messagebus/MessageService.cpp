@@ -4,7 +4,7 @@
 
 #include "errors/AmqpException.h"
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/ServiceQueueName.h"
 #include "messagelibrary/GenericResponse.h"
 
@@ -140,7 +140,7 @@ std::shared_ptr<GenericMessage> MessageService::WaitForResponse(const std::strin
     } catch (const VeldraException& error) {
         // A return notice stored its text in the queue.
         subscriber_->SynchCallbacks()->Erase(correlationId);
-        throw AmqpException(AmqpErrorCodes::kDequeueingMessage, error.what(), 0);
+        throw AmqpException(ErrorCodes::kDequeueingMessage, error.what(), 0);
     }
     subscriber_->SynchCallbacks()->Erase(correlationId);
     if (!response) {
@@ -290,7 +290,7 @@ void MessageService::SetTraceLogger(std::shared_ptr<Interfaces::ITraceLogger> tr
 std::shared_ptr<Interfaces::ITraceLogger> MessageService::GetTraceLogger() const {
     auto logger = Logger();
     if (!logger) {
-        throw VeldraException(AmqpErrorCodes::kException,
+        throw VeldraException(ErrorCodes::kException,
                               "InvalidOperationException: No TraceLogger Set");
     }
     return logger;

@@ -4,7 +4,7 @@
 #include <ctime>
 #include <string>
 
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -36,7 +36,7 @@ int WaitRetryingInterrupts(WaitCall wait) {
 }  // namespace
 
 VeldraException SemaphoreInitError(int errorNumber) {
-    using namespace BusErrorCodes;
+    using namespace ErrorCodes;
     switch (errorNumber) {
         case EINVAL:
             return VeldraException(
@@ -60,7 +60,7 @@ VeldraException SemaphoreInitError(int errorNumber) {
 }
 
 VeldraException SemaphoreAcquireError(int errorNumber) {
-    using namespace BusErrorCodes;
+    using namespace ErrorCodes;
     switch (errorNumber) {
         case EDEADLK:
             return VeldraException(
@@ -105,7 +105,7 @@ bool Semaphore::Acquire(uint32_t timeoutMs) {
 
 void Semaphore::Wait() {
     if (WaitRetryingInterrupts([this] { return sem_wait(&semaphore_); }) != 0) {
-        throw VeldraException(BusErrorCodes::kException, "Acquire -- unexpected failure.");
+        throw VeldraException(ErrorCodes::kException, "Acquire -- unexpected failure.");
     }
 }
 

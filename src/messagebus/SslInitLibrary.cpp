@@ -6,7 +6,7 @@
 #include <utility>
 
 #include "errors/VeldraException.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 #ifndef KVVELDRA_SSLINIT_SONAME
 #define KVVELDRA_SSLINIT_SONAME "libkvsslinit.so.13"
@@ -75,7 +75,7 @@ SslInitLease::SslInitLease(SslInitLibrary& library) : library_(library) {
     try {
         library_.Acquire();
     } catch (const std::runtime_error& error) {
-        throw VeldraException(AmqpErrorCodes::kFailedToInitializeKVSSL, error.what());
+        throw VeldraException(ErrorCodes::kFailedToInitializeKVSSL, error.what());
     }
 }
 

@@ -1,12 +1,12 @@
 #include "messagelibrary/NotImplemented.h"
 
 #include "errors/VeldraException.h"
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 
 void ThrowNotImplemented() {
-    throw VeldraException(BusErrorCodes::kException, "Not implemented");
+    throw VeldraException(ErrorCodes::kException, "Not implemented");
 }
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -11,6 +11,7 @@
 #include <mutex>
 #include <sstream>
 
+#include "errors/ErrorCodes.h"
 #include "errors/VeldraException.h"
 #include "utilities/Paths.h"
 
@@ -38,7 +39,7 @@ std::string ReadNameFile(const std::filesystem::path& path) {
 std::string GetHostName() {
     char name[HOST_NAME_MAX + 1] = {};
     if (gethostname(name, sizeof name - 1) != 0) {
-        throw MessageBus::VeldraException(-251004, "Failed to get hostname");
+        throw MessageBus::VeldraException(ErrorCodes::kException, "Failed to get hostname");
     }
     return name;
 }

@@ -3,6 +3,7 @@
 #include <cstdlib>
 #include <filesystem>
 
+#include "errors/ErrorCodes.h"
 #include "errors/VeldraException.h"
 
 namespace Korvane::Veldra::VeldraUtilities {
@@ -32,14 +33,18 @@ std::string GetLogDirectory() {
 const std::string& GetApplicationDirectory() {
     static const std::string directory;
     if (directory.empty()) {
-        throw new MessageBus::VeldraException(-251004,
+        throw new MessageBus::VeldraException(ErrorCodes::kException,
                                               "Could not determine Application Directory");
     }
     return directory;
 }
 
-std::string GetDefaultProductName() { return "KV Fenmark"; }
+std::string GetDefaultProductName() {
+    return "KV Fenmark";
+}
 
-void GetDefaultProductName(std::string& name) { name = GetDefaultProductName(); }
+void GetDefaultProductName(std::string& name) {
+    name = GetDefaultProductName();
+}
 
 }  // namespace Korvane::Veldra::VeldraUtilities

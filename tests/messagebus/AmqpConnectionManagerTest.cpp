@@ -4,7 +4,7 @@
 
 #include "errors/AmqpException.h"
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -13,13 +13,13 @@ TEST(AmqpConnectionManager, LastErrorKeepsTextAndCodeUntilReplaced) {
     AmqpConnectionManager manager{VeldraConfiguration{}};
     VeldraException error(0, "");
     EXPECT_FALSE(manager.GetLastError(error));
-    manager.SetLastError(AmqpException(AmqpErrorCodes::kBindingQueue, "bind failed", -9));
+    manager.SetLastError(AmqpException(ErrorCodes::kBindingQueue, "bind failed", -9));
     for (int read = 0; read < 2; ++read) {
         ASSERT_TRUE(manager.GetLastError(error));
-        EXPECT_EQ(error.Code(), AmqpErrorCodes::kBindingQueue);
+        EXPECT_EQ(error.Code(), ErrorCodes::kBindingQueue);
         EXPECT_EQ(std::string(error.what()), "bind failed");
     }
-    manager.SetLastError(VeldraException(AmqpErrorCodes::kException, "later"));
+    manager.SetLastError(VeldraException(ErrorCodes::kException, "later"));
     ASSERT_TRUE(manager.GetLastError(error));
     EXPECT_EQ(std::string(error.what()), "later");
     AmqpConnectionManager::ReleaseInstance();  // none made: nothing happens

@@ -10,7 +10,7 @@
 #include "FakeSslInit.h"
 #include "messagebus/AmqpConnection.h"
 #include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -59,7 +59,7 @@ TEST(AmqpConnection, RefusedConnectionFailsWithinItsTimeout) {
         const auto failure = ConnectFailure(&manager, false, "", timeoutMs);
         const auto elapsed = std::chrono::steady_clock::now() - start;
         ASSERT_TRUE(failure.has_value());
-        EXPECT_EQ(failure->Code(), AmqpErrorCodes::kOpeningSocket);
+        EXPECT_EQ(failure->Code(), ErrorCodes::kOpeningSocket);
         EXPECT_LT(failure->Status(), 0);
         EXPECT_EQ(std::string(failure->what()),
                   "Error opening TCP socket. RabbitMQ client (rabbitmq-c) status code: " +
@@ -76,7 +76,7 @@ TEST(AmqpConnection, RefusedConnectionFailsWithinItsTimeout) {
 TEST(AmqpConnection, MissingCaFileFailsBeforeAnyConnect) {
     const auto failure = ConnectFailure(nullptr, true, "/nonexistent/ca.pem", 100);
     ASSERT_TRUE(failure.has_value());
-    EXPECT_EQ(failure->Code(), AmqpErrorCodes::kSettingCACertificate);
+    EXPECT_EQ(failure->Code(), ErrorCodes::kSettingCACertificate);
     EXPECT_EQ(std::string(failure->what()),
               "Error setting CA certificate: /nonexistent/ca.pem. AMQP status " +
                   std::to_string(failure->Status()));

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "messagebus/BlockingCollection.h"
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/CatchVeldra.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -26,8 +26,8 @@ TEST(BlockingCollection, CloseDrainsThenEndsEveryConsumer) {
     collection.Close();
     collection.Push(2);
     EXPECT_EQ(collection.Take(), 1);
-    EXPECT_THROWS_VELDRA(collection.Take(), BusErrorCodes::kEndOfStream, "End Of Stream.");
-    EXPECT_THROWS_VELDRA(collection.Take(), BusErrorCodes::kEndOfStream, "End Of Stream.");
+    EXPECT_THROWS_VELDRA(collection.Take(), ErrorCodes::kEndOfStream, "End Of Stream.");
+    EXPECT_THROWS_VELDRA(collection.Take(), ErrorCodes::kEndOfStream, "End Of Stream.");
 }
 
 TEST(BlockingCollection, HandlerThreadsShareTheWorkAndStopAtClose) {
@@ -46,7 +46,7 @@ TEST(BlockingCollection, HandlerThreadsShareTheWorkAndStopAtClose) {
                     ++count;
                 }
             });
-            if (end && end->Code() == BusErrorCodes::kEndOfStream) ++ended;
+            if (end && end->Code() == ErrorCodes::kEndOfStream) ++ended;
         });
     }
     std::thread producerA([&] {

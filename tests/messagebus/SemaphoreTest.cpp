@@ -5,7 +5,7 @@
 #include <string>
 #include <thread>
 
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/Semaphore.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -61,7 +61,7 @@ struct ErrnoCase {
 };
 
 TEST(Semaphore, InitFailureTextsAndCodes) {
-    using namespace BusErrorCodes;
+    using namespace ErrorCodes;
     const ErrnoCase cases[] = {
         {EINVAL, kInvalidSemaphoreInitialization,
          "Construct failed: EINVAL -- initialCount exceeds SEM_VALUE_MAX.\n"},
@@ -80,7 +80,7 @@ TEST(Semaphore, InitFailureTextsAndCodes) {
 }
 
 TEST(Semaphore, AcquireFailureTextsAndCodes) {
-    using namespace BusErrorCodes;
+    using namespace ErrorCodes;
     const ErrnoCase cases[] = {
         {EDEADLK, kException,
          "Acquire with timeout failed: EDEADLK -- Deadlock condition detected."},

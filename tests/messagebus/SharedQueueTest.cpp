@@ -6,7 +6,7 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/CatchVeldra.h"
 #include "messagebus/SharedQueue.h"
 
@@ -60,12 +60,12 @@ TEST(SharedQueue, StoredErrorComesAfterTheItems) {
     std::string out;
     ASSERT_TRUE(queue.TryTake(out, 0));
     EXPECT_EQ(out, "first");
-    EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), BusErrorCodes::kQueueEmpty, "Publish failed");
+    EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), ErrorCodes::kQueueEmpty, "Publish failed");
     // The error used up its count.
     EXPECT_FALSE(queue.TryTake(out, 0));
     EXPECT_EQ(out, "first");
     queue.SetError("");
-    EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), BusErrorCodes::kQueueEmpty, "");
+    EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), ErrorCodes::kQueueEmpty, "");
 }
 
 TEST(SharedQueue, ClosedQueueDrainsThenEndsEveryTake) {
@@ -78,7 +78,7 @@ TEST(SharedQueue, ClosedQueueDrainsThenEndsEveryTake) {
     ASSERT_TRUE(queue.TryTake(out, 0));
     EXPECT_EQ(out, 1);
     for (int attempt = 0; attempt < 3; ++attempt) {
-        EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), BusErrorCodes::kEndOfStream, "End Of Stream.");
+        EXPECT_THROWS_VELDRA(queue.TryTake(out, 0), ErrorCodes::kEndOfStream, "End Of Stream.");
     }
 }
 
@@ -92,7 +92,7 @@ TEST(SharedQueue, BlockedTakersWakeOnErrorAndOnClose) {
     queue.SetError("gone");
     errorTaker.join();
     ASSERT_TRUE(errorSeen.has_value());
-    EXPECT_EQ(errorSeen->Code(), BusErrorCodes::kQueueEmpty);
+    EXPECT_EQ(errorSeen->Code(), ErrorCodes::kQueueEmpty);
     EXPECT_EQ(std::string(errorSeen->what()), "gone");
 
     std::vector<std::optional<VeldraException>> closeSeen(3);
@@ -107,7 +107,7 @@ TEST(SharedQueue, BlockedTakersWakeOnErrorAndOnClose) {
     for (auto& taker : takers) taker.join();
     for (const auto& seen : closeSeen) {
         ASSERT_TRUE(seen.has_value());
-        EXPECT_EQ(seen->Code(), BusErrorCodes::kEndOfStream);
+        EXPECT_EQ(seen->Code(), ErrorCodes::kEndOfStream);
     }
 }
 

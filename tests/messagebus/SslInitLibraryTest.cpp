@@ -6,7 +6,7 @@
 
 #include "CatchVeldra.h"
 #include "FakeSslInit.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/SslInitLibrary.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -49,7 +49,7 @@ TEST(SslInitLibrary, FailedFirstAcquireUnloadsAndGivesTheReason) {
         fakeSsl = {};
         c.arrange(fakeSsl);
         SslInitLibrary library("libfake.so", Testing::FakeSslLoader());
-        EXPECT_THROWS_VELDRA(SslInitLease(library), AmqpErrorCodes::kFailedToInitializeKVSSL,
+        EXPECT_THROWS_VELDRA(SslInitLease(library), ErrorCodes::kFailedToInitializeKVSSL,
                              c.text);
         EXPECT_EQ(fakeSsl.closes, fakeSsl.openFails ? 0 : 1) << c.text;
         EXPECT_EQ(library.Count(), 0);

@@ -3,7 +3,7 @@
 #include <memory>
 #include <string>
 
-#include "messagebus/BusErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/CatchVeldra.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/GenericMessage.h"
@@ -82,12 +82,12 @@ TEST(GenericResponse, ParseFailuresNameTheMessageOrTheField) {
         const char* text;
     };
     const Case cases[] = {
-        {"", BusErrorCodes::kFailedToParse, "Failed to parse: GenericResponse"},
-        {R"({"RequestName":"x")", BusErrorCodes::kFailedToParse,
+        {"", ErrorCodes::kFailedToParse, "Failed to parse: GenericResponse"},
+        {R"({"RequestName":"x")", ErrorCodes::kFailedToParse,
          "Failed to parse: GenericResponse"},
-        {R"({"RequestName":"x"} x)", BusErrorCodes::kFailedToParse,
+        {R"({"RequestName":"x"} x)", ErrorCodes::kFailedToParse,
          "Failed to parse: GenericResponse"},
-        {R"({"RequestName":12})", BusErrorCodes::kFailedToParse, "Failed to parse: RequestName"},
+        {R"({"RequestName":12})", ErrorCodes::kFailedToParse, "Failed to parse: RequestName"},
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(c.body);
@@ -99,7 +99,7 @@ TEST(GenericResponse, ParseFailuresNameTheMessageOrTheField) {
 }
 
 TEST(GenericResponse, UnsupportedBodyOperationThrowsNotImplemented) {
-    EXPECT_THROWS_VELDRA(ThrowNotImplemented(), BusErrorCodes::kException, "Not implemented");
+    EXPECT_THROWS_VELDRA(ThrowNotImplemented(), ErrorCodes::kException, "Not implemented");
 }
 
 }  // namespace

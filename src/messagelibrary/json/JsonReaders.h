@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "messagelibrary/json/JsonEnum.h"
+#include "errors/ErrorCodes.h"
 #include "messagelibrary/json/JsonVariant.h"
 #include "messagelibrary/json/Timestamp.h"
 
@@ -55,8 +56,8 @@ using JsonStringList = std::vector<std::string>;
 using JsonStringMap = std::map<std::string, std::string>;
 
 // Codes of the exceptions thrown for a refused field.
-constexpr int32_t kJsonFieldRefusedCode = -251005;        // Veldra.FailedToParse
-constexpr int32_t kJsonRecordFieldRefusedCode = -251004;  // Veldra.Exception
+constexpr int32_t kJsonFieldRefusedCode = ErrorCodes::kFailedToParse;
+constexpr int32_t kJsonRecordFieldRefusedCode = ErrorCodes::kException;
 
 template <typename R, typename = void>
 struct IsJsonReadableRecord : std::false_type {};

@@ -1,5 +1,6 @@
 #include "taglibrary/exports/Frame.h"
 
+#include "errors/ErrorCodes.h"
 #include "errors/ErrorTable.h"
 #include "errors/MessageInserts.h"
 
@@ -17,7 +18,7 @@ int32_t FormatNamedError(const std::string& name, const std::vector<std::string>
         return row->code;
     }
     text.clear();
-    return -251000;
+    return ErrorCodes::kInternalServiceError;
 }
 
 std::shared_ptr<Client> LookupClient(uint64_t instanceId) {

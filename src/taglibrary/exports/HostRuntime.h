@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 
+#include "errors/ErrorCodes.h"
 #include "kvveldra/WBTypes.h"
 
 namespace Korvane::Veldra::TagLibrary {
@@ -28,6 +29,6 @@ struct HostRuntime {
 };
 
 // Returned when the process lacks a host function that a call needs.
-constexpr int32_t kHostFunctionMissing = -251008;  // "Veldra.NotSupported"
+constexpr int32_t kHostFunctionMissing = ErrorCodes::kNotSupported;
 
 }  // namespace Korvane::Veldra::TagLibrary

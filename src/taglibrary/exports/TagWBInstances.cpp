@@ -1,4 +1,5 @@
 // Reservation and instance functions of the host family.
+#include "errors/ErrorCodes.h"
 #include "kvveldra/TagWB.h"
 #include "taglibrary/exports/ErrorOut.h"
 #include "taglibrary/exports/HostStrings.h"
@@ -8,7 +9,7 @@ using namespace Korvane::Veldra::TagLibrary;
 
 namespace {
 
-constexpr int32_t kUnexpectedException = -251037;
+using Korvane::Veldra::ErrorCodes::kUnexpectedException;
 
 }  // namespace
 

@@ -10,7 +10,7 @@
 
 #include "errors/AmqpException.h"
 #include "messagebus/AmqpConnection.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/TestCertificates.h"
 #include "support/BrokerEnvironment.h"
 #include "support/RawAmqpConnection.h"
@@ -92,7 +92,7 @@ TEST(AmqpConnectionBroker, ExchangeIsDeclaredOncePerConnectionObject) {
         Connect(exchange)->CreateChannel();
         ADD_FAILURE() << "the first channel of a new connection did not declare";
     } catch (const AmqpException& error) {
-        EXPECT_EQ(error.Code(), AmqpErrorCodes::kDeclaringExchange);
+        EXPECT_EQ(error.Code(), ErrorCodes::kDeclaringExchange);
         EXPECT_EQ(std::string(error.what()),
                   "Error declaring topic exchange. Channel ID: 1. Exchange name: \"" + exchange +
                       "\". AMQP Server Exception. Method Id: " +
@@ -120,7 +120,7 @@ TEST(AmqpConnectionBroker, TlsChecksThePeerAlwaysAndTheNameOnlyForNames) {
 
     auto failure = TlsFailure(Broker().HostName, Broker().OtherCaCertPath);
     ASSERT_TRUE(failure.has_value());
-    EXPECT_EQ(failure->Code(), AmqpErrorCodes::kPeerVerifyFailed);
+    EXPECT_EQ(failure->Code(), ErrorCodes::kPeerVerifyFailed);
     EXPECT_EQ(std::string(failure->what()),
               "SSL peer verification failed. RabbitMQ client (rabbitmq-c) status code: -514");
 
@@ -130,7 +130,7 @@ TEST(AmqpConnectionBroker, TlsChecksThePeerAlwaysAndTheNameOnlyForNames) {
     failure = TlsFailure(Broker().HostName, expired);
     std::filesystem::remove(expired);
     ASSERT_TRUE(failure.has_value());
-    EXPECT_EQ(failure->Code(), AmqpErrorCodes::kCertificateExpired);
+    EXPECT_EQ(failure->Code(), ErrorCodes::kCertificateExpired);
     EXPECT_EQ(std::string(failure->what()),
               "Certificate expired or system time incorrect. RabbitMQ client (rabbitmq-c) status "
               "code: -514");

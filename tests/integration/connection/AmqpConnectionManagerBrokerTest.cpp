@@ -8,7 +8,7 @@
 #include "errors/AmqpException.h"
 #include "messagebus/AmqpConnectionManager.h"
 #include "messagebus/AmqpConsumerConnection.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpPublisherConnection.h"
 #include "support/BrokerEnvironment.h"
 
@@ -81,7 +81,7 @@ TEST(AmqpConnectionManagerBroker, FailedFirstUseLeavesNoConnectionAndTriesAgain)
             manager.GetPublisherConnection();
             ADD_FAILURE() << "logged in with a wrong password";
         } catch (const AmqpException& error) {
-            EXPECT_EQ(error.Code(), AmqpErrorCodes::kFailedToLogIn);
+            EXPECT_EQ(error.Code(), ErrorCodes::kFailedToLogIn);
             EXPECT_EQ(std::string(error.what()).rfind("Error logging in to RabbitMQ. ", 0), 0u);
         }
         std::string line;

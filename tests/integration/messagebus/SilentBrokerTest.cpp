@@ -7,7 +7,7 @@
 #include <string>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpErrorCodes.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/AmqpPublisherConnection.h"
 #include "support/BrokerEnvironment.h"
 
@@ -61,7 +61,7 @@ TEST(SilentBroker, PublishIntoAFrozenBrokerFailsInsteadOfHanging) {
     });
     ASSERT_EQ(publishing.wait_for(60s), std::future_status::ready)
         << "a publish is still held by the frozen broker";
-    EXPECT_EQ(publishing.get(), MessageBus::AmqpErrorCodes::kPublishingMessage);
+    EXPECT_EQ(publishing.get(), ErrorCodes::kPublishingMessage);
 }
 
 }  // namespace
