@@ -4,6 +4,8 @@
 #include <cstring>
 #include <limits>
 
+#include "messagelibrary/json/CivilDate.h"
+
 namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
 
@@ -21,19 +23,6 @@ const ptime& UnixEpoch() {
 // in microseconds since 1970. Points outside it have no date text.
 constexpr int64_t kFirstMicros = -17987443200LL * kMicrosPerSecond;
 constexpr int64_t kLastMicros = 253402300800LL * kMicrosPerSecond - 1;
-
-// Days since 1970-01-01 to a proleptic Gregorian date.
-void CivilFromDays(int64_t days, int64_t& year, unsigned& month, unsigned& day) {
-    days += 719468;
-    const int64_t era = (days >= 0 ? days : days - 146096) / 146097;
-    const unsigned doe = static_cast<unsigned>(days - era * 146097);
-    const unsigned yoe = (doe - doe / 1460 + doe / 36524 - doe / 146096) / 365;
-    const unsigned doy = doe - (365 * yoe + yoe / 4 - yoe / 100);
-    const unsigned mp = (5 * doy + 2) / 153;
-    day = doy - (153 * mp + 2) / 5 + 1;
-    month = mp < 10 ? mp + 3 : mp - 9;
-    year = static_cast<int64_t>(yoe) + era * 400 + (month <= 2 ? 1 : 0);
-}
 
 void AppendDigits(std::string& out, int64_t value, int width) {
     char buffer[24];
@@ -145,8 +134,8 @@ Timestamp TimestampFromTicks(int64_t ticks) {
 }
 
 Timestamp TimestampFromUnixSeconds(int64_t seconds) {
-    constexpr int64_t kLimit = (std::numeric_limits<int64_t>::max() - kUnixEpochTicks) /
-                               kMicrosPerSecond;
+    constexpr int64_t kLimit =
+        (std::numeric_limits<int64_t>::max() - kUnixEpochTicks) / kMicrosPerSecond;
     if (seconds > kLimit) return Timestamp(boost::posix_time::pos_infin);
     if (seconds < kFirstMicros / kMicrosPerSecond) return Timestamp(boost::posix_time::neg_infin);
     const int64_t ticks = seconds * kMicrosPerSecond + kUnixEpochTicks;
@@ -169,17 +158,15 @@ void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
         rest += kMicrosPerDay;
         --days;
     }
-    int64_t year = 0;
-    unsigned month = 0, day = 0;
-    CivilFromDays(days, year, month, day);
+    const CivilDate date = CivilFromDays(days);
     const int64_t secondsOfDay = rest / kMicrosPerSecond;
     const int64_t fraction = rest % kMicrosPerSecond;
 
-    AppendDigits(out, year, 4);
+    AppendDigits(out, date.year, 4);
     out.push_back('-');
-    AppendDigits(out, month, 2);
+    AppendDigits(out, date.month, 2);
     out.push_back('-');
-    AppendDigits(out, day, 2);
+    AppendDigits(out, date.day, 2);
     out.push_back('T');
     AppendDigits(out, secondsOfDay / 3600, 2);
     out.push_back(':');

@@ -4,24 +4,13 @@
 #include <cmath>
 #include <stdexcept>
 
+#include "messagelibrary/json/CivilDate.h"
+
 namespace Korvane::Veldra::TagLibrary {
 namespace {
 
 constexpr double kTwoToThe64 = 18446744073709551616.0;
 constexpr int64_t kMicrosPerSecond = 1000000;
-
-// Days since 1970-01-01 to a proleptic Gregorian date.
-void CivilFromDays(int64_t days, int64_t& year, int64_t& month, int64_t& day) {
-    days += 719468;
-    const int64_t era = (days >= 0 ? days : days - 146096) / 146097;
-    const int64_t doe = days - era * 146097;
-    const int64_t yoe = (doe - doe / 1460 + doe / 36524 - doe / 146096) / 365;
-    const int64_t doy = doe - (365 * yoe + yoe / 4 - yoe / 100);
-    const int64_t mp = (5 * doy + 2) / 153;
-    day = doy - (153 * mp + 2) / 5 + 1;
-    month = mp < 10 ? mp + 3 : mp - 9;
-    year = yoe + era * 400 + (month <= 2 ? 1 : 0);
-}
 
 int64_t FloorDiv(int64_t a, int64_t b) {
     const int64_t q = a / b;
@@ -74,15 +63,14 @@ Timestamp HostTimeToTimestamp(const WBTimestamp& hostTime) {
     const int64_t unixSeconds = seconds - kHostEpochOffsetSeconds;
     const int64_t days = FloorDiv(unixSeconds, 86400);
     const int64_t secondOfDay = unixSeconds - days * 86400;
-    int64_t year = 0, month = 0, day = 0;
-    CivilFromDays(days, year, month, day);
+    const VeldraMessageLibrary::CivilDate civil = VeldraMessageLibrary::CivilFromDays(days);
     // The calendar takes 1400 to 9999; a year of 10000 is refused with the same text.
-    if (year < 1400 || year > 9999) {
+    if (civil.year < 1400 || civil.year > 9999) {
         throw std::out_of_range("Year is out of valid range: 1400..10000");
     }
-    const boost::gregorian::date date(static_cast<unsigned short>(year),
-                                      static_cast<unsigned short>(month),
-                                      static_cast<unsigned short>(day));
+    const boost::gregorian::date date(static_cast<unsigned short>(civil.year),
+                                      static_cast<unsigned short>(civil.month),
+                                      static_cast<unsigned short>(civil.day));
     return Timestamp(date,
                      boost::posix_time::microseconds(secondOfDay * kMicrosPerSecond + micros));
 }
