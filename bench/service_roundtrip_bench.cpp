@@ -26,9 +26,9 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/MessageService.h"
-#include "messagebus/Semaphore.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/service/MessageService.h"
+#include "messagebus/concurrency/Semaphore.h"
 #include "messagelibrary/RequestMessage.h"
 
 namespace {

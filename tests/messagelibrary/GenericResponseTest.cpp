@@ -4,7 +4,7 @@
 #include <string>
 
 #include "errors/ErrorCodes.h"
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/GenericMessage.h"
 #include "messagelibrary/GenericResponse.h"

@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "messagelibrary/MessageClassCases.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/RoutedMessage.h"

@@ -1,4 +1,4 @@
-#include "messagebus/AmqpChannel.h"
+#include "messagebus/amqp/AmqpChannel.h"
 
 #include <algorithm>
 #include <utility>

@@ -8,9 +8,9 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/ResetEvent.h"
-#include "messagebus/Semaphore.h"
-#include "messagebus/SharedQueue.h"
+#include "messagebus/concurrency/ResetEvent.h"
+#include "messagebus/concurrency/Semaphore.h"
+#include "messagebus/concurrency/SharedQueue.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,4 +1,4 @@
-#include "messagebus/AmqpConnection.h"
+#include "messagebus/amqp/AmqpConnection.h"
 
 #include <amqp_ssl_socket.h>
 #include <amqp_tcp_socket.h>
@@ -12,11 +12,11 @@
 #include <utility>
 #include <vector>
 
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpReplyText.h"
-#include "messagebus/CaCertificate.h"
-#include "messagebus/TlsSocketRules.h"
+#include "messagebus/amqp/AmqpReplyText.h"
+#include "messagebus/amqp/CaCertificate.h"
+#include "messagebus/amqp/TlsSocketRules.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

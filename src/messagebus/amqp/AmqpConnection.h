@@ -13,10 +13,10 @@
 #include <unordered_map>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpChannel.h"
-#include "messagebus/AmqpGate.h"
-#include "messagebus/Semaphore.h"
-#include "messagebus/SslInitLibrary.h"
+#include "messagebus/amqp/AmqpChannel.h"
+#include "messagebus/amqp/AmqpGate.h"
+#include "messagebus/concurrency/Semaphore.h"
+#include "messagebus/amqp/SslInitLibrary.h"
 
 namespace Korvane::Veldra::MessageBus {
 

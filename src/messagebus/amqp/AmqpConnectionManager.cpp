@@ -1,11 +1,11 @@
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 
 #include <utility>
 
-#include "messagebus/AmqpConsumerConnection.h"
+#include "messagebus/amqp/AmqpConsumerConnection.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpPublisherConnection.h"
-#include "messagebus/BusConfigurations.h"
+#include "messagebus/amqp/AmqpPublisherConnection.h"
+#include "messagebus/config/BusConfigurations.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -7,10 +7,10 @@
 #include <vector>
 
 #include "errors/VeldraException.h"
-#include "messagebus/AmqpChannel.h"
-#include "messagebus/ResetEvent.h"
-#include "messagebus/SharedQueue.h"
-#include "messagebus/VeldraConfiguration.h"
+#include "messagebus/amqp/AmqpChannel.h"
+#include "messagebus/concurrency/ResetEvent.h"
+#include "messagebus/concurrency/SharedQueue.h"
+#include "messagebus/config/VeldraConfiguration.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageHeaders.h"
 

@@ -1,11 +1,11 @@
-#include "messagebus/AmqpConsumer.h"
+#include "messagebus/amqp/AmqpConsumer.h"
 
 #include <iostream>
 #include <utility>
 
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/EnvelopeHeaders.h"
+#include "messagebus/amqp/EnvelopeHeaders.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

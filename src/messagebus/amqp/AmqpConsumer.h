@@ -8,9 +8,9 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/AmqpChannel.h"
-#include "messagebus/AmqpConsumerBuilder.h"
-#include "messagebus/Semaphore.h"
+#include "messagebus/amqp/AmqpChannel.h"
+#include "messagebus/amqp/AmqpConsumerBuilder.h"
+#include "messagebus/concurrency/Semaphore.h"
 #include "utilities/tracelogging/TracePoint.h"
 
 namespace Korvane::Veldra::MessageBus {

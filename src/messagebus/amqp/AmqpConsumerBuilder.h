@@ -5,7 +5,7 @@
 #include <memory>
 #include <string>
 
-#include "messagebus/AmqpChannel.h"
+#include "messagebus/amqp/AmqpChannel.h"
 #include "messagebus/interfaces/IMessageSubscriberReceiveCallback.h"
 #include "utilities/tracelogging/ITraceLogger.h"
 

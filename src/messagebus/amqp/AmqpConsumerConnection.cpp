@@ -1,4 +1,4 @@
-#include "messagebus/AmqpConsumerConnection.h"
+#include "messagebus/amqp/AmqpConsumerConnection.h"
 
 #include <chrono>
 #include <new>
@@ -6,7 +6,7 @@
 #include <utility>
 
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpFrames.h"
+#include "messagebus/amqp/AmqpFrames.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

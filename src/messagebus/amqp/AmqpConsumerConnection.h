@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/AmqpPollingConnection.h"
-#include "messagebus/ResetEvent.h"
+#include "messagebus/amqp/AmqpPollingConnection.h"
+#include "messagebus/concurrency/ResetEvent.h"
 
 namespace Korvane::Veldra::MessageBus {
 

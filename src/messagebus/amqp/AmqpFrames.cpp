@@ -1,6 +1,6 @@
-#include "messagebus/AmqpFrames.h"
+#include "messagebus/amqp/AmqpFrames.h"
 
-#include "messagebus/AmqpPropertiesC.h"
+#include "messagebus/amqp/AmqpPropertiesC.h"
 
 namespace Korvane::Veldra::MessageBus {
 

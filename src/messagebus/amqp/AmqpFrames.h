@@ -5,7 +5,7 @@
 #include <optional>
 #include <string>
 
-#include "messagebus/ResetEvent.h"
+#include "messagebus/concurrency/ResetEvent.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,4 +1,4 @@
-#include "messagebus/AmqpGate.h"
+#include "messagebus/amqp/AmqpGate.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,10 +1,10 @@
-#include "messagebus/AmqpPollingConnection.h"
+#include "messagebus/amqp/AmqpPollingConnection.h"
 
 #include <algorithm>
 #include <utility>
 
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpFrames.h"
+#include "messagebus/amqp/AmqpFrames.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

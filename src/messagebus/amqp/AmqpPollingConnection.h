@@ -7,9 +7,9 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/AmqpConnection.h"
-#include "messagebus/ResetEvent.h"
-#include "messagebus/SocketWatchdog.h"
+#include "messagebus/amqp/AmqpConnection.h"
+#include "messagebus/concurrency/ResetEvent.h"
+#include "messagebus/amqp/SocketWatchdog.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,4 +1,4 @@
-#include "messagebus/AmqpPropertiesC.h"
+#include "messagebus/amqp/AmqpPropertiesC.h"
 
 #include <string>
 

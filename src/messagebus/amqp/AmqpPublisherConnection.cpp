@@ -1,12 +1,12 @@
-#include "messagebus/AmqpPublisherConnection.h"
+#include "messagebus/amqp/AmqpPublisherConnection.h"
 
 #include <new>
 #include <utility>
 
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpFrames.h"
-#include "messagebus/AmqpPropertiesC.h"
+#include "messagebus/amqp/AmqpFrames.h"
+#include "messagebus/amqp/AmqpPropertiesC.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 
 namespace Korvane::Veldra::MessageBus {

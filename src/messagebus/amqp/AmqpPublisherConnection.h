@@ -7,7 +7,7 @@
 #include <cstdint>
 #include <string>
 
-#include "messagebus/AmqpPollingConnection.h"
+#include "messagebus/amqp/AmqpPollingConnection.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageHeaders.h"
 

@@ -1,4 +1,4 @@
-#include "messagebus/AmqpReplyText.h"
+#include "messagebus/amqp/AmqpReplyText.h"
 
 #include <cstring>
 

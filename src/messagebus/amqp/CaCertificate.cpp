@@ -1,4 +1,4 @@
-#include "messagebus/CaCertificate.h"
+#include "messagebus/amqp/CaCertificate.h"
 
 #include <openssl/asn1.h>
 #include <openssl/err.h>

@@ -1,7 +1,7 @@
-#include "messagebus/EnvelopeHeaders.h"
+#include "messagebus/amqp/EnvelopeHeaders.h"
 
-#include "messagebus/AmqpFrames.h"
-#include "messagebus/AmqpPropertiesC.h"
+#include "messagebus/amqp/AmqpFrames.h"
+#include "messagebus/amqp/AmqpPropertiesC.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 
 namespace Korvane::Veldra::MessageBus {

@@ -1,4 +1,4 @@
-#include "messagebus/SocketWatchdog.h"
+#include "messagebus/amqp/SocketWatchdog.h"
 
 #include <sys/socket.h>
 

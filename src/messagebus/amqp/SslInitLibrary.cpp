@@ -1,4 +1,4 @@
-#include "messagebus/SslInitLibrary.h"
+#include "messagebus/amqp/SslInitLibrary.h"
 
 #include <dlfcn.h>
 

@@ -1,4 +1,4 @@
-#include "messagebus/TlsSocketRules.h"
+#include "messagebus/amqp/TlsSocketRules.h"
 
 #include <filesystem>
 

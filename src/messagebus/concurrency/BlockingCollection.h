@@ -4,8 +4,8 @@
 #include <mutex>
 #include <utility>
 
-#include "messagebus/EmptyTake.h"
-#include "messagebus/Semaphore.h"
+#include "messagebus/concurrency/EmptyTake.h"
+#include "messagebus/concurrency/Semaphore.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,4 +1,4 @@
-#include "messagebus/EmptyTake.h"
+#include "messagebus/concurrency/EmptyTake.h"
 
 #include "errors/VeldraException.h"
 #include "errors/ErrorCodes.h"

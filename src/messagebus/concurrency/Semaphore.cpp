@@ -1,4 +1,4 @@
-#include "messagebus/Semaphore.h"
+#include "messagebus/concurrency/Semaphore.h"
 
 #include <cerrno>
 #include <ctime>

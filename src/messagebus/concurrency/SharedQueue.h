@@ -6,8 +6,8 @@
 #include <string>
 #include <utility>
 
-#include "messagebus/EmptyTake.h"
-#include "messagebus/Semaphore.h"
+#include "messagebus/concurrency/EmptyTake.h"
+#include "messagebus/concurrency/Semaphore.h"
 
 namespace Korvane::Veldra::MessageBus {
 

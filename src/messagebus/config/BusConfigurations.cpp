@@ -1,4 +1,4 @@
-#include "messagebus/BusConfigurations.h"
+#include "messagebus/config/BusConfigurations.h"
 
 #include <algorithm>
 #include <fstream>

@@ -10,7 +10,7 @@
 #include <utility>
 #include <vector>
 
-#include "messagebus/VeldraConfiguration.h"
+#include "messagebus/config/VeldraConfiguration.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,4 +1,4 @@
-#include "messagebus/VeldraConfiguration.h"
+#include "messagebus/config/VeldraConfiguration.h"
 
 #include "errors/VeldraException.h"
 #include "messagelibrary/json/JsonReaders.h"

@@ -2,7 +2,7 @@
 
 #include <memory>
 
-#include "messagebus/ResetEvent.h"
+#include "messagebus/concurrency/ResetEvent.h"
 #include "messagelibrary/GenericMessage.h"
 
 namespace Korvane::Veldra::MessageBus::Interfaces {

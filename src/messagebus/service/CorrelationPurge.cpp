@@ -1,4 +1,4 @@
-#include "messagebus/CorrelationPurge.h"
+#include "messagebus/service/CorrelationPurge.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/SubscriberCallbackInfo.h"
+#include "messagebus/service/SubscriberCallbackInfo.h"
 
 namespace Korvane::Veldra::MessageBus {
 

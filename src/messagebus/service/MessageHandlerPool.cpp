@@ -1,4 +1,4 @@
-#include "messagebus/MessageHandlerPool.h"
+#include "messagebus/service/MessageHandlerPool.h"
 
 #include <utility>
 

@@ -7,7 +7,7 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/BlockingCollection.h"
+#include "messagebus/concurrency/BlockingCollection.h"
 #include "messagelibrary/GenericMessage.h"
 
 namespace Korvane::Veldra::MessageBus {

@@ -1,9 +1,9 @@
-#include "messagebus/MessagePublisher.h"
+#include "messagebus/service/MessagePublisher.h"
 
 #include <utility>
 
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/PublishMessageCallback.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/service/PublishMessageCallback.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

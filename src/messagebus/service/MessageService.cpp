@@ -1,11 +1,11 @@
-#include "messagebus/MessageService.h"
+#include "messagebus/service/MessageService.h"
 
 #include <utility>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/ServiceQueueName.h"
+#include "messagebus/service/ServiceQueueName.h"
 #include "messagelibrary/GenericResponse.h"
 
 namespace Korvane::Veldra::MessageBus {

@@ -6,10 +6,10 @@
 #include <optional>
 #include <string>
 
-#include "messagebus/MessagePublisher.h"
-#include "messagebus/MessageServiceSettings.h"
-#include "messagebus/MessageSubscriber.h"
-#include "messagebus/ThreadSafeMap.h"
+#include "messagebus/service/MessagePublisher.h"
+#include "messagebus/service/MessageServiceSettings.h"
+#include "messagebus/service/MessageSubscriber.h"
+#include "messagebus/concurrency/ThreadSafeMap.h"
 #include "messagebus/interfaces/IBroadcastCallback.h"
 #include "messagebus/interfaces/IRegisterBroadcastCallback.h"
 #include "messagebus/interfaces/IResponseCallback.h"

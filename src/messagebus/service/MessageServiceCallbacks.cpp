@@ -1,6 +1,6 @@
 #include <utility>
 
-#include "messagebus/MessageService.h"
+#include "messagebus/service/MessageService.h"
 
 namespace Korvane::Veldra::MessageBus {
 

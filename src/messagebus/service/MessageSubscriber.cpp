@@ -1,10 +1,10 @@
-#include "messagebus/MessageSubscriber.h"
+#include "messagebus/service/MessageSubscriber.h"
 
 #include <utility>
 
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpConsumer.h"
-#include "messagebus/MessageSubscriberReceiveCallback.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConsumer.h"
+#include "messagebus/service/MessageSubscriberReceiveCallback.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -6,11 +6,11 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/CorrelationPurge.h"
-#include "messagebus/MessageHandlerPool.h"
-#include "messagebus/MessageSubscriberBuilder.h"
-#include "messagebus/ResetEvent.h"
-#include "messagebus/SubscriberCallbackInfo.h"
+#include "messagebus/service/CorrelationPurge.h"
+#include "messagebus/service/MessageHandlerPool.h"
+#include "messagebus/service/MessageSubscriberBuilder.h"
+#include "messagebus/concurrency/ResetEvent.h"
+#include "messagebus/service/SubscriberCallbackInfo.h"
 #include "utilities/tracelogging/TracePoint.h"
 
 namespace Korvane::Veldra::MessageBus {

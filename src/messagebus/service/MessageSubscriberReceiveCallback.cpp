@@ -1,8 +1,8 @@
-#include "messagebus/MessageSubscriberReceiveCallback.h"
+#include "messagebus/service/MessageSubscriberReceiveCallback.h"
 
 #include <utility>
 
-#include "messagebus/MessageSubscriber.h"
+#include "messagebus/service/MessageSubscriber.h"
 
 namespace Korvane::Veldra::MessageBus {
 

@@ -1,6 +1,6 @@
-#include "messagebus/PublishMessageCallback.h"
+#include "messagebus/service/PublishMessageCallback.h"
 
-#include "messagebus/MessagePublisher.h"
+#include "messagebus/service/MessagePublisher.h"
 
 namespace Korvane::Veldra::MessageBus {
 

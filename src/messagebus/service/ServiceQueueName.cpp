@@ -1,4 +1,4 @@
-#include "messagebus/ServiceQueueName.h"
+#include "messagebus/service/ServiceQueueName.h"
 
 #include "messagelibrary/MessageIdentity.h"
 

@@ -5,8 +5,8 @@
 #include <memory>
 #include <string>
 
-#include "messagebus/SharedQueue.h"
-#include "messagebus/ThreadSafeMap.h"
+#include "messagebus/concurrency/SharedQueue.h"
+#include "messagebus/concurrency/ThreadSafeMap.h"
 #include "messagebus/interfaces/IBroadcastCallback.h"
 #include "messagebus/interfaces/IResponseCallback.h"
 #include "messagelibrary/GenericMessage.h"

@@ -9,9 +9,9 @@
 #include <string>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpConnection.h"
+#include "messagebus/amqp/AmqpConnection.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/TestCertificates.h"
+#include "messagebus/amqp/TestCertificates.h"
 #include "support/BrokerEnvironment.h"
 #include "support/RawAmqpConnection.h"
 

@@ -6,10 +6,10 @@
 #include <vector>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpConsumerConnection.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConsumerConnection.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpPublisherConnection.h"
+#include "messagebus/amqp/AmqpPublisherConnection.h"
 #include "support/BrokerEnvironment.h"
 
 namespace Korvane::Veldra::MessageBus {

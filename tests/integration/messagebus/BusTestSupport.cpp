@@ -7,7 +7,7 @@
 #include <stdexcept>
 #include <thread>
 
-#include "messagebus/VeldraConfiguration.h"
+#include "messagebus/config/VeldraConfiguration.h"
 #include "support/BrokerEnvironment.h"
 
 namespace Korvane::Veldra::Testing {

@@ -10,8 +10,8 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/AmqpConsumer.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConsumer.h"
 
 namespace Korvane::Veldra::Testing {
 

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "BusTestSupport.h"
-#include "messagebus/AmqpFrames.h"
+#include "messagebus/amqp/AmqpFrames.h"
 
 namespace Korvane::Veldra::Testing {
 namespace {

@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "BusTestSupport.h"
-#include "messagebus/AmqpConsumerConnection.h"
+#include "messagebus/amqp/AmqpConsumerConnection.h"
 #include "support/BrokerEnvironment.h"
 
 namespace Korvane::Veldra::Testing {

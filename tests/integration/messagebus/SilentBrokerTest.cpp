@@ -8,7 +8,7 @@
 
 #include "errors/AmqpException.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/AmqpPublisherConnection.h"
+#include "messagebus/amqp/AmqpPublisherConnection.h"
 #include "support/BrokerEnvironment.h"
 
 namespace Korvane::Veldra::Testing {

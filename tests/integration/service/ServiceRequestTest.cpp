@@ -7,7 +7,7 @@
 #include "ServiceTestSupport.h"
 #include "errors/AmqpException.h"
 #include "errors/ErrorTable.h"
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "messagelibrary/GenericResponse.h"
 
 namespace Korvane::Veldra::Testing {

@@ -9,8 +9,8 @@
 #include <utility>
 
 #include "messagebus/BusTestSupport.h"
-#include "messagebus/MessageService.h"
-#include "messagebus/RecordingTraceLogger.h"
+#include "messagebus/service/MessageService.h"
+#include "messagebus/service/RecordingTraceLogger.h"
 #include "messagelibrary/BroadcastMessage.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/RoutedMessage.h"

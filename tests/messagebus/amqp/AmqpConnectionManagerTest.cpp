@@ -3,7 +3,7 @@
 #include <string>
 
 #include "errors/AmqpException.h"
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {

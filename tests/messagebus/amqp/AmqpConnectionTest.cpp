@@ -8,8 +8,8 @@
 #include <string>
 
 #include "FakeSslInit.h"
-#include "messagebus/AmqpConnection.h"
-#include "messagebus/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpConnection.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
 
 namespace Korvane::Veldra::MessageBus {

@@ -6,7 +6,7 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/AmqpGate.h"
+#include "messagebus/amqp/AmqpGate.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

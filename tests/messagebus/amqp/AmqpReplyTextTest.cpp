@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "messagebus/AmqpConnection.h"
-#include "messagebus/AmqpReplyText.h"
+#include "messagebus/amqp/AmqpConnection.h"
+#include "messagebus/amqp/AmqpReplyText.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

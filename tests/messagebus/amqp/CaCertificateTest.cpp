@@ -3,7 +3,7 @@
 #include <string>
 
 #include "errors/VeldraException.h"
-#include "messagebus/CaCertificate.h"
+#include "messagebus/amqp/CaCertificate.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "messagebus/AmqpFrames.h"
-#include "messagebus/EnvelopeHeaders.h"
+#include "messagebus/amqp/AmqpFrames.h"
+#include "messagebus/amqp/EnvelopeHeaders.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

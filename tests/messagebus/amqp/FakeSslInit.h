@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "messagebus/SslInitLibrary.h"
+#include "messagebus/amqp/SslInitLibrary.h"
 
 namespace Korvane::Veldra::MessageBus::Testing {
 

@@ -7,8 +7,8 @@
 #include <chrono>
 #include <future>
 
-#include "messagebus/AmqpConsumerConnection.h"
-#include "messagebus/SocketWatchdog.h"
+#include "messagebus/amqp/AmqpConsumerConnection.h"
+#include "messagebus/amqp/SocketWatchdog.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

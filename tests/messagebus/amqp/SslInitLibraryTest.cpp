@@ -4,10 +4,10 @@
 #include <stdexcept>
 #include <string>
 
-#include "CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "FakeSslInit.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/SslInitLibrary.h"
+#include "messagebus/amqp/SslInitLibrary.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

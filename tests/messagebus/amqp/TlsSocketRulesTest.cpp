@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "messagebus/TlsSocketRules.h"
+#include "messagebus/amqp/TlsSocketRules.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

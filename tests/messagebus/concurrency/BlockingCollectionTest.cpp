@@ -5,9 +5,9 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/BlockingCollection.h"
+#include "messagebus/concurrency/BlockingCollection.h"
 #include "errors/ErrorCodes.h"
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

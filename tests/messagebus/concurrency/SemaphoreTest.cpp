@@ -6,7 +6,7 @@
 #include <thread>
 
 #include "errors/ErrorCodes.h"
-#include "messagebus/Semaphore.h"
+#include "messagebus/concurrency/Semaphore.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

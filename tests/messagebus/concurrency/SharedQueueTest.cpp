@@ -7,8 +7,8 @@
 #include <vector>
 
 #include "errors/ErrorCodes.h"
-#include "messagebus/CatchVeldra.h"
-#include "messagebus/SharedQueue.h"
+#include "support/CatchVeldra.h"
+#include "messagebus/concurrency/SharedQueue.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -4,7 +4,7 @@
 #include <thread>
 #include <vector>
 
-#include "messagebus/ThreadSafeMap.h"
+#include "messagebus/concurrency/ThreadSafeMap.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

@@ -5,7 +5,7 @@
 #include <fstream>
 
 #include "errors/VeldraException.h"
-#include "messagebus/BusConfigurations.h"
+#include "messagebus/config/BusConfigurations.h"
 #include "messagelibrary/json/JsonParser.h"
 #include "utilities/Paths.h"
 

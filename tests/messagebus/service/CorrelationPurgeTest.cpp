@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/CorrelationPurge.h"
+#include "messagebus/service/CorrelationPurge.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {

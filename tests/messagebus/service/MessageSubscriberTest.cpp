@@ -8,10 +8,10 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/AmqpConnectionManager.h"
-#include "messagebus/MessageSubscriber.h"
-#include "messagebus/MessageSubscriberReceiveCallback.h"
-#include "messagebus/RecordingTraceLogger.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/service/MessageSubscriber.h"
+#include "messagebus/service/MessageSubscriberReceiveCallback.h"
+#include "messagebus/service/RecordingTraceLogger.h"
 
 // The subscriber is built with no consumers, so no broker is needed: the
 // tests hand it messages through its receive callback as a consumer would.

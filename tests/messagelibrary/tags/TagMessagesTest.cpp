@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "messagelibrary/GenericMessage.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"

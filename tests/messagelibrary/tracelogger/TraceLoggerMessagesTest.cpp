@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "messagebus/CatchVeldra.h"
+#include "support/CatchVeldra.h"
 #include "messagelibrary/MessageClassCases.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandRequest.h"
