@@ -1,0 +1,32 @@
+#include "utilities/tracelogging/TraceText.h"
+
+#include "messagelibrary/json/Timestamp.h"
+
+namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
+
+namespace Messages = VeldraMessageLibrary::TraceLoggerMessages;
+
+std::string ChildLoggerName(const std::string& parent, const std::string& name) {
+    std::string full;
+    full.reserve(parent.size() + 1 + name.size());
+    full.append(parent).append(1, '.').append(name);
+    return full;
+}
+
+std::string ErrorEntryText(const MessageBus::MessageError& error) {
+    if (error.info.empty()) return error.FullName();
+    return error.FullName() + ": " + error.info;
+}
+
+std::string ConsoleLine(const Messages::TraceEntry& entry) {
+    std::string line = VeldraMessageLibrary::TimestampToText(entry.timestamp);
+    if (line.empty() || line.back() != 'Z') line.push_back('Z');
+    line.append(" | ").append(entry.moduleName.value_or(""));
+    if (entry.tracePointName) line.append(" | ").append(*entry.tracePointName);
+    line.append(" | ");
+    if (entry.type == Messages::TraceEntryType::Error) line.append("ERROR - ");
+    line.append(entry.text.value_or("")).append(1, '\n');
+    return line;
+}
+
+}  // namespace Korvane::Veldra::VeldraUtilities::TraceLogging
