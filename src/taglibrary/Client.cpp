@@ -4,9 +4,10 @@
 
 namespace Korvane::Veldra::TagLibrary {
 
-Client::Client(const std::string& configurationId, uint32_t timeoutMs, bool allowFallback,
-               bool verbose, std::shared_ptr<TagIngestion::Errors> errors)
+Client::Client(LocalOnly, const std::string& configurationId, uint32_t timeoutMs,
+               bool allowFallback, bool verbose, std::shared_ptr<TagIngestion::Errors> errors)
     : verbose_(verbose),
+      requestMap_(std::make_shared<AsyncRequestMap>()),
       errors_(std::move(errors)),
       tags_(std::make_shared<TagMap>()),
       configurationId_(configurationId),

@@ -11,7 +11,20 @@
 
 #include "errors/Errors.h"
 #include "errors/VeldraException.h"
+#include "messagelibrary/MessageBase.h"
 #include "taglibrary/TagData.h"
+#include "taglibrary/requests/AsyncRequest.h"
+#include "taglibrary/requests/AsyncRequestMap.h"
+#include "taglibrary/requests/AsyncResponseCallbacks.h"
+
+namespace Korvane::Veldra::MessageBus {
+class AmqpConnectionManager;
+class MessageService;
+}  // namespace Korvane::Veldra::MessageBus
+
+namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
+class ProcessLogger;
+}
 
 namespace Korvane::Veldra::TagLibrary {
 
@@ -21,12 +34,62 @@ using TagMap = std::unordered_map<std::string, std::shared_ptr<TagData>>;
 // caller's open tags and, through the bus, the tag services. Every operation
 // returns 0 or a negative error code and, on failure, stores the formatted
 // text in `error`.
+//
+// A bus operation has two halves: the start half files the caller's request
+// under a request id and sends one message; the caller waits on its request
+// by its own means; the finish half takes the request out by its id and
+// evaluates the reply.
 class Client {
 public:
+    // Selects the broker configuration, connects a manager of its own (within
+    // `timeoutMs`), starts the message service "TagClient" and its trace
+    // logging. Throws what the configuration or the bus throws.
     Client(const std::string& configurationId, uint32_t timeoutMs, bool allowFallback, bool verbose,
            std::shared_ptr<TagIngestion::Errors> errors);
+    // The local half alone, with no bus: for tools and tests of the table.
+    // Every send reports "Tag.InvalidState".
+    struct LocalOnly {};
+    Client(LocalOnly, const std::string& configurationId, uint32_t timeoutMs, bool allowFallback,
+           bool verbose, std::shared_ptr<TagIngestion::Errors> errors);
+    // Stops the trace logging, then the message service, then the rest.
+    ~Client();
     Client(const Client&) = delete;
     Client& operator=(const Client&) = delete;
+
+    // ---- The two send paths and the finish ----
+    // Files the request and sends a request message, mandatory; the reply is
+    // matched by its message name.
+    int32_t SendTrackedRequest(MessageBus::MessageBase& message,
+                               const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                               uint32_t& timeoutMs, std::string& error);
+    // Files the request and sends a routed message asking for an answer; the
+    // reply is matched by the message's correlation id.
+    int32_t SendTrackedRouted(MessageBus::MessageBase& message,
+                              const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                              uint32_t& timeoutMs, std::string& error);
+    // Takes the request out and evaluates it; a second finish of one id
+    // reports "Tag.InvalidState".
+    int32_t TakeFinishedRequest(uint32_t requestId, std::shared_ptr<AsyncRequest>& request,
+                                std::string& error);
+    int32_t FinishRequest(uint32_t requestId, std::string& error);
+
+    // ---- Open ----
+    // Sends the lookup of one path; a path that is empty or holds '*' is
+    // refused before anything is sent.
+    int32_t OpenTag(const std::string& path, const std::shared_ptr<AsyncRequest>& request,
+                    uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // Finishes the lookup of `requestId`. One record of the wanted type maps
+    // the tag; one of another type is "Tag.ConflictingTagTypes"; otherwise a
+    // create goes out with `request`, and `requestId` becomes its id.
+    int32_t OpenOrCreateTag(uint64_t instanceId, const std::string& path,
+                            std::optional<TagDataType> dataType,
+                            const std::shared_ptr<AsyncRequest>& request, bool& found,
+                            std::shared_ptr<TagData>& tag, uint32_t& requestId,
+                            uint32_t& timeoutMs, std::string& error);
+    // Finishes the create and maps the tag when it succeeded.
+    int32_t FinishCreateTag(uint64_t instanceId, const std::string& path,
+                            std::optional<TagDataType> dataType, uint32_t requestId,
+                            std::shared_ptr<TagData>& tag, std::string& error);
 
     // Maps a path to its record: a new one with one session, or the existing
     // one with its type replaced and one more session.
@@ -56,12 +119,31 @@ public:
 
     // The number of open paths; for diagnostics and tests.
     std::size_t OpenTagCount() const;
+    // The time-out that the start halves hand out: the service's default.
+    uint32_t RequestTimeoutMs() const;
+    const std::shared_ptr<AsyncRequestMap>& RequestMap() const { return requestMap_; }
+    // Null for a local Client.
+    MessageBus::MessageService* Service() const { return messageService_.get(); }
 
 private:
     // Prints a verbose progress line that carries a tag path.
     void Trace(const char* format, const std::string& path) const;
+    // Steps 2 and 3 of both send paths: publish, hand out the time-out, and
+    // on failure take the request back out.
+    template <typename Send>
+    int32_t SendFiled(uint32_t requestId, Send send, uint32_t& timeoutMs, std::string& error);
+    // Stops the logging thread and releases the service, then the logger.
+    void ShutdownBus() noexcept;
 
     std::atomic<bool> verbose_;
+    // Declared so that, should construction fail half-way, the members go in
+    // an order that is safe for the bus: the service's threads end before the
+    // callback and the manager that they use.
+    std::shared_ptr<AsyncRequestMap> requestMap_;
+    std::shared_ptr<MessageBus::AmqpConnectionManager> connectionManager_;
+    std::shared_ptr<GenericAsyncResponseCallback> responseCallback_;
+    std::shared_ptr<VeldraUtilities::TraceLogging::ProcessLogger> processLogger_;
+    std::shared_ptr<MessageBus::MessageService> messageService_;
     std::shared_ptr<TagIngestion::Errors> errors_;
     std::shared_ptr<TagMap> tags_;
     mutable std::mutex mutex_;

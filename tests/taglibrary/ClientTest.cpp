@@ -15,7 +15,7 @@ protected:
     void SetUp() override {
         errors_ = std::make_shared<Korvane::Veldra::TagIngestion::Errors>();
         errors_->initialize();
-        client_ = std::make_unique<Client>("veldra_master", 1000, true, false, errors_);
+        client_ = std::make_unique<Client>(Client::LocalOnly{}, "veldra_master", 1000, true, false, errors_);
     }
 
     std::shared_ptr<Korvane::Veldra::TagIngestion::Errors> errors_;

@@ -1,5 +1,7 @@
 #include "taglibrary/exports/Instances.h"
 
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/config/BusConfigurations.h"
 #include "taglibrary/exports/ErrorOut.h"
 
 namespace Korvane::Veldra::TagLibrary {
@@ -9,6 +11,14 @@ ClientFactory DefaultClientFactory() {
               std::shared_ptr<TagIngestion::Errors> errors) {
         return std::make_shared<Client>(configurationId, timeoutMs, allowFallback, false,
                                         std::move(errors));
+    };
+}
+
+ClientFactory LocalClientFactory() {
+    return [](const std::string& configurationId, uint32_t timeoutMs, bool allowFallback,
+              std::shared_ptr<TagIngestion::Errors> errors) {
+        return std::make_shared<Client>(Client::LocalOnly{}, configurationId, timeoutMs,
+                                        allowFallback, false, std::move(errors));
     };
 }
 
@@ -42,9 +52,10 @@ int32_t UnreserveProcess(bool* reserved, bool discardConfigurations) {
         references.swap(state.TagReferenceTable);
         state.SetSharedErrors(nullptr);
     }
-    // The process-wide connection manager, and for the host family the parsed
-    // configuration directory, go here once the bus is part of the library.
-    (void)discardConfigurations;
+    clients.clear();
+    references.clear();
+    MessageBus::AmqpConnectionManager::ReleaseInstance();
+    if (discardConfigurations) MessageBus::BusConfigurations::Discard();
     return 0;
 }
 

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "errors/VeldraException.h"
+#include "kvveldra/WBTypes.h"
 #include "taglibrary/Client.h"
 #include "taglibrary/exports/Frame.h"
 
@@ -28,6 +29,8 @@ using ClientFactory = std::function<std::shared_ptr<Client>(
     const std::string& configurationId, uint32_t timeoutMs, bool allowFallback,
     std::shared_ptr<TagIngestion::Errors> errors)>;
 ClientFactory DefaultClientFactory();
+// Clients of the local half alone, for tests of the frame without a broker.
+ClientFactory LocalClientFactory();
 
 // The steps of initialize common to both families, under the table mutex
 // for the whole call. `created` may be null.
@@ -67,6 +70,14 @@ int32_t InitializeInstance(uint64_t instanceId, const std::optional<std::string>
     if (created != nullptr) *created = true;
     return 0;
 }
+
+// The two initialize functions, with their arguments in each family's form.
+int32_t InitializeConsoleInstance(uint64_t instanceId, const std::string* configurationId,
+                                  const uint32_t* timeoutMs, const bool* allowFallback,
+                                  std::string* error, const ClientFactory& factory);
+int32_t InitializeHostInstance(uint64_t instanceId, WBStrHandle* configurationId,
+                               uint32_t timeoutMs, const bool* allowFallback, bool* created,
+                               WBStrHandle* error, const ClientFactory& factory);
 
 // Removes a non-default instance from the table. Instance 0 gives 1.
 template <typename ErrorOut>

@@ -33,16 +33,8 @@ int32_t TagConsoleUnreserve(bool* reserved) {
 int32_t TagConsoleInitialize(uint64_t instanceId, const std::string* configurationId,
                              const uint32_t* timeoutMs, const bool* allowFallback,
                              std::string* error) {
-    ConsoleErrorOut out(error);
-    return RunInFrame(out, [&] {
-        std::optional<std::string> configuration;
-        if (configurationId != nullptr) configuration = *configurationId;
-        std::optional<uint32_t> timeout;
-        if (timeoutMs != nullptr) timeout = *timeoutMs;
-        const bool fallback = allowFallback == nullptr || *allowFallback;
-        return InitializeInstance(instanceId, configuration, timeout, fallback, nullptr, out,
-                                  DefaultClientFactory());
-    });
+    return InitializeConsoleInstance(instanceId, configurationId, timeoutMs, allowFallback, error,
+                                     DefaultClientFactory());
 }
 
 int32_t TagConsoleCloseInstance(uint64_t instanceId, std::string* error) {

@@ -31,20 +31,8 @@ int32_t TagWBUnreserve(bool* reserved) {
 
 int32_t TagWBInitialize(uint64_t instanceId, WBStrHandle* configurationId, uint32_t timeoutMs,
                         const bool* allowFallback, bool* created, WBStrHandle* error) {
-    HostErrorOut out(error);
-    return RunInFrame(out, [&] {
-        std::optional<std::string> configuration;
-        if (configurationId != nullptr) configuration = ReadHostString(configurationId);
-        std::optional<uint32_t> timeout;
-        if (timeoutMs != 0) timeout = timeoutMs;
-        // The host passes a byte; any non-zero value is true.
-        bool fallback = true;
-        if (allowFallback != nullptr) {
-            fallback = *reinterpret_cast<const unsigned char*>(allowFallback) != 0;
-        }
-        return InitializeInstance(instanceId, configuration, timeout, fallback, created, out,
-                                  DefaultClientFactory());
-    });
+    return InitializeHostInstance(instanceId, configurationId, timeoutMs, allowFallback, created,
+                                  error, DefaultClientFactory());
 }
 
 int32_t TagWBCloseInstance(uint64_t instanceId, WBStrHandle* error) {

@@ -42,7 +42,7 @@ TEST(Reservation, CountsCallersAndTearsDownAtTheLast) {
     EXPECT_EQ(ProcessState::Get().ReserveCount.load(), 2);
     const auto errors = ProcessState::Get().SharedErrors();
     ASSERT_NE(errors, nullptr);
-    EXPECT_EQ(TagConsoleInitialize(4, nullptr, nullptr, nullptr, nullptr), 0);
+    EXPECT_EQ(InitializeConsoleInstance(4, nullptr, nullptr, nullptr, nullptr, LocalClientFactory()), 0);
 
     EXPECT_EQ(TagConsoleUnreserve(&first), 0);
     EXPECT_EQ(TagConsoleUnreserve(&first), 0);  // cleared flag: no-op
@@ -67,19 +67,19 @@ TEST_F(Frame, InitializeChoosesSettings) {
     const uint32_t timeout = 2500;
     const bool noFallback = false;
     std::string error;
-    ASSERT_EQ(TagConsoleInitialize(0, &configuration, &timeout, &noFallback, &error), 0);
+    ASSERT_EQ(InitializeLocal(0, &configuration, &timeout, &noFallback, &error), 0);
     auto client = ClientOf(0);
     EXPECT_EQ(client->ConfigurationId(), "veldra_master");
     EXPECT_EQ(client->ConnectTimeoutMs(), 180000u);
     EXPECT_TRUE(client->AllowFallback());
 
-    ASSERT_EQ(TagConsoleInitialize(7, nullptr, &timeout, &noFallback, &error), 0);
+    ASSERT_EQ(InitializeLocal(7, nullptr, &timeout, &noFallback, &error), 0);
     client = ClientOf(7);
     EXPECT_EQ(client->ConfigurationId(), "veldra_master");
     EXPECT_EQ(client->ConnectTimeoutMs(), 2500u);
     EXPECT_TRUE(client->AllowFallback());
 
-    ASSERT_EQ(TagConsoleInitialize(8, &configuration, nullptr, &noFallback, &error), 0);
+    ASSERT_EQ(InitializeLocal(8, &configuration, nullptr, &noFallback, &error), 0);
     client = ClientOf(8);
     EXPECT_EQ(client->ConfigurationId(), "site_a");
     EXPECT_EQ(client->ConnectTimeoutMs(), 180000u);
@@ -87,7 +87,7 @@ TEST_F(Frame, InitializeChoosesSettings) {
 
     // A live instance ignores a second initialize.
     const std::string other = "site_b";
-    ASSERT_EQ(TagConsoleInitialize(8, &other, &timeout, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(8, &other, &timeout, nullptr, &error), 0);
     EXPECT_EQ(ClientOf(8), client);
     EXPECT_EQ(ClientOf(8)->ConfigurationId(), "site_a");
     EXPECT_EQ(error, "");
@@ -115,7 +115,7 @@ TEST_F(Frame, FailedConstructionLeavesTheDefinedState) {
     // The null entry counts as absent, and the next initialize tries afresh.
     int32_t type = 0;
     EXPECT_EQ(TagConsoleCloseInstance(6, &error), -251900);
-    EXPECT_EQ(Initialize(5, DefaultClientFactory(), error), 0);
+    EXPECT_EQ(Initialize(5, LocalClientFactory(), error), 0);
     EXPECT_NE(ClientOf(5), nullptr);
     EXPECT_EQ(ClientOf(5)->ConfigurationId(), "cfg");
     EXPECT_EQ(ClientOf(5)->ConnectTimeoutMs(), 5u);
@@ -124,8 +124,8 @@ TEST_F(Frame, FailedConstructionLeavesTheDefinedState) {
 
 TEST_F(Frame, CloseInstanceAndTagCallsOnItsReferences) {
     std::string error;
-    ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0);
-    ASSERT_EQ(TagConsoleInitialize(7, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(0, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(7, nullptr, nullptr, nullptr, &error), 0);
     EXPECT_EQ(TagConsoleCloseInstance(0, &error), 1);
     EXPECT_EQ(error, "");
     EXPECT_NE(ClientOf(0), nullptr);
@@ -152,7 +152,7 @@ TEST_F(Frame, CloseInstanceAndTagCallsOnItsReferences) {
 
 TEST_F(Frame, ConsoleCloseCountsSessionsAndKeepsVerbose) {
     std::string error;
-    ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(0, nullptr, nullptr, nullptr, &error), 0);
     const uint32_t reference = OpenLocal(0, "a", TagDataType::String);
     ASSERT_EQ(OpenLocal(0, "a", TagDataType::String), reference);
 
@@ -171,8 +171,8 @@ TEST_F(Frame, ConsoleCloseCountsSessionsAndKeepsVerbose) {
 
 TEST_F(Frame, ImplicitClose) {
     std::string error;
-    ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0);
-    ASSERT_EQ(TagConsoleInitialize(7, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(0, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(7, nullptr, nullptr, nullptr, &error), 0);
     const uint32_t ofSeven = OpenLocal(7, "x", TagDataType::Int);
     const uint32_t alsoOfSeven = OpenLocal(7, "y", TagDataType::Int);
     const uint32_t ofDefault = OpenLocal(0, "z", TagDataType::Int);
@@ -208,7 +208,7 @@ TEST_F(Frame, UnexpectedExceptionsBecomeStatusAndText) {
 
 TEST_F(Frame, ConcurrentCallersOnTheTables) {
     std::string error;
-    ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0);
+    ASSERT_EQ(InitializeLocal(0, nullptr, nullptr, nullptr, &error), 0);
     constexpr int kThreads = 4;
     constexpr int kRounds = 300;
     std::atomic<int> failures{0};
@@ -218,7 +218,7 @@ TEST_F(Frame, ConcurrentCallersOnTheTables) {
             const uint64_t instance = 100 + static_cast<uint64_t>(t);
             std::string text;
             for (int i = 0; i < kRounds; ++i) {
-                if (TagConsoleInitialize(instance, nullptr, nullptr, nullptr, &text) != 0)
+                if (InitializeLocal(instance, nullptr, nullptr, nullptr, &text) != 0)
                     ++failures;
                 const auto tag = ClientOf(instance)->MapTag(instance, "p", TagDataType::Double);
                 RegisterReference(tag);

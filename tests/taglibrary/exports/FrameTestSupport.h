@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "kvveldra/TagConsole.h"
+#include "taglibrary/exports/Instances.h"
 #include "taglibrary/exports/ProcessState.h"
 
 namespace FrameTestSupport {
@@ -17,6 +18,20 @@ protected:
     void TearDown() override {
         ASSERT_EQ(TagConsoleUnreserve(&reserved_), 0);
         ASSERT_EQ(ProcessState::Get().ReserveCount.load(), 0);
+    }
+
+    // The initialize functions of both families, making Clients without a bus.
+    static int32_t InitializeLocal(uint64_t instanceId, const std::string* configurationId,
+                                   const uint32_t* timeoutMs, const bool* allowFallback,
+                                   std::string* error) {
+        return InitializeConsoleInstance(instanceId, configurationId, timeoutMs, allowFallback,
+                                         error, LocalClientFactory());
+    }
+    static int32_t InitializeHostLocal(uint64_t instanceId, WBStrHandle* configurationId,
+                                       uint32_t timeoutMs, const bool* allowFallback,
+                                       bool* created, WBStrHandle* error) {
+        return InitializeHostInstance(instanceId, configurationId, timeoutMs, allowFallback,
+                                      created, error, LocalClientFactory());
     }
 
     static std::shared_ptr<Client> ClientOf(uint64_t instanceId, bool* present = nullptr) {

@@ -31,19 +31,19 @@ TEST_F(HostFrame, InitializeAndCloseWithHostStrings) {
     HostString configuration("site_a"), empty, error;
     bool created = false;
     const bool fallback = false;
-    EXPECT_EQ(TagWBInitialize(3, &configuration.handle, 0, &fallback, &created, &error.handle), 0);
+    EXPECT_EQ(InitializeHostLocal(3, &configuration.handle, 0, &fallback, &created, &error.handle), 0);
     EXPECT_TRUE(created);
     EXPECT_EQ(ClientOf(3)->ConfigurationId(), "site_a");
     EXPECT_EQ(ClientOf(3)->ConnectTimeoutMs(), 180000u);
     EXPECT_FALSE(ClientOf(3)->AllowFallback());
 
     created = false;
-    EXPECT_EQ(TagWBInitialize(3, &configuration.handle, 10, &fallback, &created, &error.handle), 0);
+    EXPECT_EQ(InitializeHostLocal(3, &configuration.handle, 10, &fallback, &created, &error.handle), 0);
     EXPECT_FALSE(created);  // already live: nothing changes
 
     // An empty string counts as no configuration; a non-zero byte is true.
     const unsigned char two = 2;
-    EXPECT_EQ(TagWBInitialize(4, &empty.handle, 10, reinterpret_cast<const bool*>(&two), &created,
+    EXPECT_EQ(InitializeHostLocal(4, &empty.handle, 10, reinterpret_cast<const bool*>(&two), &created,
                               &error.handle),
               0);
     EXPECT_EQ(ClientOf(4)->ConfigurationId(), "veldra_master");
@@ -59,7 +59,7 @@ TEST_F(HostFrame, InitializeAndCloseWithHostStrings) {
 TEST_F(HostFrame, TagCallsReportIntoTheHostString) {
     HostString error("a much longer text that was here before");
     bool created = false;
-    ASSERT_EQ(TagWBInitialize(0, nullptr, 0, nullptr, &created, &error.handle), 0);
+    ASSERT_EQ(InitializeHostLocal(0, nullptr, 0, nullptr, &created, &error.handle), 0);
     const auto tag = ClientOf(0)->MapTag(0, "t", TagDataType::DateTime);
     RegisterReference(tag);
 

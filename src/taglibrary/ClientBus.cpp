@@ -1,0 +1,150 @@
+// The bus half of the Client: construction and shutdown in their order, the
+// two send paths and the finish step that every operation shares.
+#include <algorithm>
+#include <limits>
+
+#include "errors/AmqpException.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/config/BusConfigurations.h"
+#include "messagebus/service/MessageService.h"
+#include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
+#include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsResponse.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
+#include "taglibrary/Client.h"
+#include "utilities/tracelogging/ProcessLogger.h"
+#include "utilities/tracelogging/TraceLogger.h"
+
+namespace Korvane::Veldra::TagLibrary {
+
+namespace {
+
+const char* const kServiceName = "TagClient";
+
+}  // namespace
+
+Client::Client(const std::string& configurationId, uint32_t timeoutMs, bool allowFallback,
+               bool verbose, std::shared_ptr<TagIngestion::Errors> errors)
+    : verbose_(verbose),
+      requestMap_(std::make_shared<AsyncRequestMap>()),
+      configurationId_(configurationId),
+      timeoutMs_(timeoutMs),
+      allowFallback_(allowFallback) {
+    using namespace MessageBus;
+    const BusConfigurationEntry entry =
+        BusConfigurations::GetNamed(configurationId, allowFallback);
+    connectionManager_ = std::make_shared<AmqpConnectionManager>(entry.Configuration);
+    // The time that a first connection may take; not the time-out of requests.
+    connectionManager_->SetConnectTimeout(static_cast<int32_t>(
+        std::min<uint32_t>(timeoutMs, std::numeric_limits<int32_t>::max())));
+
+    MessageServiceSettings settings;
+    settings.Name = kServiceName;
+    settings.ConnectionManager = connectionManager_.get();
+    messageService_ = std::make_shared<MessageService>(settings);
+
+    errors_ = std::move(errors);
+    tags_ = std::make_shared<TagMap>();
+    try {
+        responseCallback_ = std::make_shared<GenericAsyncResponseCallback>(requestMap_);
+        processLogger_ = std::make_shared<VeldraUtilities::TraceLogging::ProcessLogger>(
+            kServiceName, messageService_->GetPublishCallback(),
+            messageService_->GetRegisterCallback());
+        messageService_->SetTraceLogger(
+            std::make_shared<VeldraUtilities::TraceLogging::TraceLogger>(kServiceName,
+                                                                         processLogger_));
+        for (const std::string* name :
+             {&VeldraMessageLibrary::TagCurrentValueMessages::TagCvQueryCurrentValuesByPathResponse::
+                  kMessageName,
+              &VeldraMessageLibrary::TagInfoMessages::TagInfoCreateOrUpdateTagsResponse::kMessageName,
+              &VeldraMessageLibrary::TagInfoMessages::TagInfoQueryTagsResponse::kMessageName}) {
+            messageService_->RegisterResponseCallback(*name, responseCallback_.get());
+        }
+    } catch (...) {
+        ShutdownBus();
+        throw;
+    }
+}
+
+Client::~Client() {
+    ShutdownBus();
+}
+
+void Client::ShutdownBus() noexcept {
+    // The logger publishes through the service, and the service delivers to
+    // the logger's snapshot callback: stop the logger's thread, let the
+    // service's threads end, and only then let the logger go.
+    if (processLogger_) processLogger_->Stop();
+    std::shared_ptr<MessageBus::MessageService> service = std::move(messageService_);
+    service.reset();
+    std::shared_ptr<VeldraUtilities::TraceLogging::ProcessLogger> logger =
+        std::move(processLogger_);
+    logger.reset();
+}
+
+uint32_t Client::RequestTimeoutMs() const {
+    return messageService_ ? messageService_->DefaultTimeoutMs()
+                           : MessageBus::MessageServiceSettings().DefaultTimeoutMs;
+}
+
+template <typename Send>
+int32_t Client::SendFiled(uint32_t requestId, Send send, uint32_t& timeoutMs, std::string& error) {
+    try {
+        if (!messageService_) {
+            requestMap_->Take(requestId);
+            return ReportError("Tag.InvalidState", error);
+        }
+        send(*messageService_);
+        timeoutMs = messageService_->DefaultTimeoutMs();
+        return 0;
+    } catch (const MessageBus::VeldraException& exception) {
+        requestMap_->Take(requestId);
+        return ReportException(exception, error);
+    } catch (const std::exception& exception) {
+        requestMap_->Take(requestId);
+        return ReportUnexpectedException(exception, error);
+    }
+}
+
+int32_t Client::SendTrackedRequest(MessageBus::MessageBase& message,
+                                   const std::shared_ptr<AsyncRequest>& request,
+                                   uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
+    requestId = requestMap_->Add(request);
+    if (requestId == 0) return ReportError("Tag.InvalidState", error);
+    const uint32_t state = requestId;
+    return SendFiled(
+        requestId,
+        [&](MessageBus::MessageService& service) { service.SendRequestAsync(message, state, true); },
+        timeoutMs, error);
+}
+
+int32_t Client::SendTrackedRouted(MessageBus::MessageBase& message,
+                                  const std::shared_ptr<AsyncRequest>& request,
+                                  uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
+    requestId = requestMap_->Add(request);
+    if (requestId == 0) return ReportError("Tag.InvalidState", error);
+    const uint32_t state = requestId;
+    return SendFiled(
+        requestId,
+        [&](MessageBus::MessageService& service) {
+            // The reply, a GenericResponse, goes straight to the callback by
+            // the correlation id: routed messages have no response name.
+            service.Subscriber()->RegisterCorrelationCallback(message.CorrelationId(),
+                                                              responseCallback_, state);
+            service.SendRouted(message, false);
+        },
+        timeoutMs, error);
+}
+
+int32_t Client::TakeFinishedRequest(uint32_t requestId, std::shared_ptr<AsyncRequest>& request,
+                                    std::string& error) {
+    request = requestMap_->Take(requestId);
+    if (!request) return ReportError("Tag.InvalidState", error);
+    return request->CheckResult(*errors_, error);
+}
+
+int32_t Client::FinishRequest(uint32_t requestId, std::string& error) {
+    std::shared_ptr<AsyncRequest> request;
+    return TakeFinishedRequest(requestId, request, error);
+}
+
+}  // namespace Korvane::Veldra::TagLibrary
