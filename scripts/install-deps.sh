@@ -10,6 +10,7 @@ packages=(
   libgtest-dev libgmock-dev googletest libbenchmark-dev
   clang libclang-rt-14-dev
   rapidjson-dev
+  libsqlite3-dev
 )
 if [ "${1:-}" = "--with-broker" ]; then
   packages+=(rabbitmq-server)

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <ostream>
+#include <string>
+
+#include "utilities/tracelogging/ITraceLogger.h"
+
+namespace Korvane::Veldra::TagService {
+
+// Writes one line in the console form: timestamp, " | tagservice | ", text.
+void WriteLogLine(std::ostream& out, const std::string& text);
+
+// Bus errors go to standard error; trace points stay off.
+class ConsoleTraceLogger : public MessageBus::Interfaces::ITraceLogger {
+public:
+    MessageBus::TracePoint GetTracePoint(const std::string& name) override;
+    void Log(const MessageBus::TracePoint& point, const std::string& text) override;
+    void Error(const std::string& text) override;
+};
+
+}  // namespace Korvane::Veldra::TagService

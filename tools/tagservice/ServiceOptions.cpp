@@ -1,0 +1,79 @@
+#include "ServiceOptions.h"
+
+#include <stdexcept>
+
+namespace Korvane::Veldra::TagService {
+
+namespace {
+
+int32_t ParseTimeout(const std::string& text) {
+    std::size_t used = 0;
+    long value = 0;
+    try {
+        value = std::stol(text, &used);
+    } catch (const std::exception&) {
+        used = 0;
+    }
+    if (used != text.size() || value <= 0 || value > 3600000) {
+        throw std::invalid_argument("--connect-timeout needs milliseconds from 1 to 3600000, not '" +
+                                    text + "'");
+    }
+    return static_cast<int32_t>(value);
+}
+
+}  // namespace
+
+ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
+    ServiceOptions options;
+    for (std::size_t i = 0; i < args.size(); ++i) {
+        const std::string& arg = args[i];
+        const auto value = [&]() -> const std::string& {
+            if (i + 1 >= args.size() || args[i + 1].empty()) {
+                throw std::invalid_argument(arg + " needs a value");
+            }
+            return args[++i];
+        };
+        if (arg == "--help" || arg == "-h") {
+            options.help = true;
+        } else if (arg == "--verbose") {
+            options.verbose = true;
+        } else if (arg == "--config") {
+            options.configurationId = value();
+        } else if (arg == "--store") {
+            options.storeFile = value();
+        } else if (arg == "--connect-timeout") {
+            options.connectTimeoutMs = ParseTimeout(value());
+        } else {
+            throw std::invalid_argument("unknown argument '" + arg + "'");
+        }
+    }
+    return options;
+}
+
+std::string UsageText() {
+    return std::string(
+               "Usage: kvveldra-tagservice [--config ID] [--store FILE] [--verbose]\n"
+               "                           [--connect-timeout MS] [--help]\n"
+               "\n"
+               "Serves the TagInfo, TagCurrentValue and TagIngestion messages on the bus.\n"
+               "\n"
+               "  --config ID           broker configuration id in VeldraConfigurations under\n"
+               "                        the data root ($VELDRA_DATA_DIR, else /etc/korvane/kvveldra);\n"
+               "                        default veldra_master, falling back to veldra_localhost\n"
+               "                        and veldra_master when the id is not there\n"
+               "  --store FILE          keep tags, values and aggregates in this SQLite file;\n"
+               "                        without it they live in memory only\n"
+               "  --verbose             one line on standard output per message handled\n"
+               "  --connect-timeout MS  how long the first connection may take (default 10000)\n"
+               "  --help                this text\n"
+               "\n"
+               "Once its consumers are started it prints the line\n"
+               "  ") +
+           kReadyLine +
+           " (queue NAME, store memory|FILE)\n"
+           "on standard output. SIGINT or SIGTERM stop it cleanly with status 0.\n"
+           "Exit status: 0 stopped by a signal, 1 bad arguments, 2 no broker or no\n"
+           "configuration, 3 the store cannot be opened.\n";
+}
+
+}  // namespace Korvane::Veldra::TagService

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+namespace Korvane::Veldra::TagService {
+
+// The command line of kvveldra-tagservice.
+struct ServiceOptions {
+    std::string configurationId = "veldra_master";  // --config ID
+    std::string storeFile;                           // --store FILE; empty: in memory
+    bool verbose = false;                            // --verbose
+    bool help = false;                               // --help
+    int32_t connectTimeoutMs = 10000;                // --connect-timeout MS
+};
+
+// The line printed on standard output once the service serves.
+inline constexpr const char* kReadyLine = "kvveldra-tagservice ready";
+
+// Reads the arguments after the program name; throws std::invalid_argument
+// with a message naming the bad argument.
+ServiceOptions ParseServiceOptions(const std::vector<std::string>& args);
+
+// The text of --help.
+std::string UsageText();
+
+}  // namespace Korvane::Veldra::TagService

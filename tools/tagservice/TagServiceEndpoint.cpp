@@ -1,0 +1,194 @@
+#include "TagServiceEndpoint.h"
+
+#include <iostream>
+#include <utility>
+
+#include "ServiceLog.h"
+#include "messagebus/service/MessageServiceSettings.h"
+#include "messagelibrary/TagServices.h"
+#include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
+#include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsResponse.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
+
+namespace Korvane::Veldra::TagService {
+
+namespace {
+
+using MessageBus::MessageError;
+
+MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager& manager) {
+    MessageBus::MessageServiceSettings settings;
+    settings.Name = "TagService";
+    settings.ConnectionManager = &manager;
+    // Consuming starts once every handler is registered and bound.
+    settings.AutoStart = false;
+    return settings;
+}
+
+// Hands each message of one name to a function.
+class Handler : public MessageBus::Interfaces::IBroadcastCallback {
+public:
+    explicit Handler(std::function<void(const MessageBus::GenericMessage&)> handle)
+        : handle_(std::move(handle)) {}
+    void OnMessage(std::shared_ptr<MessageBus::GenericMessage> message) override {
+        handle_(*message);
+    }
+
+private:
+    std::function<void(const MessageBus::GenericMessage&)> handle_;
+};
+
+}  // namespace
+
+TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager,
+                                       TagServiceLogic& logic, bool verbose)
+    : logic_(logic), verbose_(verbose), service_(SettingsOn(manager)) {
+    service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
+    RegisterHandlers();
+    for (const std::string& target : {VeldraMessageLibrary::kTagInfoService,
+                                      VeldraMessageLibrary::kTagCurrentValueService,
+                                      VeldraMessageLibrary::kTagIngestionService}) {
+        service_.Subscriber()->Bind({target, "#"});
+    }
+    service_.Subscriber()->StartConsuming();
+}
+
+TagServiceEndpoint::~TagServiceEndpoint() {
+    try {
+        service_.Subscriber()->StopConsuming();
+    } catch (const std::exception& error) {
+        WriteLogLine(std::cerr, std::string("stopping the consumers failed: ") + error.what());
+    }
+}
+
+void TagServiceEndpoint::RegisterHandlers() {
+    OnRouted<TagInfo::TagInfoCreateTagRoutedMessage>(
+        [this](const auto& message) { return logic_.CreateTag(message); });
+    OnRouted<TagInfo::TagInfoUpdateTagRoutedMessage>(
+        [this](const auto& message) { return logic_.UpdateTag(message); });
+    OnRouted<TagInfo::TagInfoDeleteTagsRoutedMessage>(
+        [this](const auto& message) { return logic_.DeleteTags(message); });
+    OnRouted<TagIngest::TagUpdateValuesRoutedMessage>(
+        [this](const auto& message) { return logic_.UpdateValues(message); });
+    OnRouted<TagCv::TagCvResetAggregatesRoutedMessage>(
+        [this](const auto& message) { return logic_.ResetAggregates(message); });
+
+    OnRequest<TagInfo::TagInfoQueryTagsRequest, TagInfo::TagInfoQueryTagsResponse>(
+        [this](const Received& received, const auto& request, Broadcasts&) {
+            TagPage page = logic_.QueryTags(request);
+            return std::make_unique<TagInfo::TagInfoQueryTagsResponse>(
+                received, std::move(page.tags), page.totalCount);
+        });
+    OnRequest<TagInfo::TagInfoCreateOrUpdateTagsRequest,
+              TagInfo::TagInfoCreateOrUpdateTagsResponse>(
+        [this](const Received& received, const auto& request, Broadcasts& broadcasts) {
+            ChangeOutcome outcome = logic_.CreateOrUpdateTags(request);
+            broadcasts = std::move(outcome.broadcasts);
+            return std::make_unique<TagInfo::TagInfoCreateOrUpdateTagsResponse>(
+                received, std::move(outcome.errors));
+        });
+    OnRequest<TagCv::TagCvQueryCurrentValuesByPathRequest,
+              TagCv::TagCvQueryCurrentValuesByPathResponse>(
+        [this](const Received& received, const auto& request, Broadcasts&) {
+            return std::make_unique<TagCv::TagCvQueryCurrentValuesByPathResponse>(
+                received, logic_.QueryCurrentValues(request));
+        });
+}
+
+void TagServiceEndpoint::On(const std::string& messageName,
+                            std::function<void(const Received&)> handle) {
+    service_.Subscriber()->RegisterMessageCallback(
+        messageName, std::make_shared<Handler>(std::move(handle)), false);
+}
+
+template <typename Message>
+std::optional<Message> TagServiceEndpoint::Parse(const Received& received,
+                                                 std::optional<MessageError>& error) {
+    std::optional<Message> message;
+    try {
+        message.emplace(received.Headers(), received.Body());
+    } catch (const std::exception& failure) {
+        error = Failure(received, failure, true);
+    }
+    return message;
+}
+
+template <typename Message>
+void TagServiceEndpoint::OnRouted(std::function<Outcome(const Message&)> handle) {
+    On(Message::kMessageName, [this, handle](const Received& received) {
+        std::optional<MessageError> error;
+        Broadcasts broadcasts;
+        if (const auto message = Parse<Message>(received, error)) {
+            try {
+                Outcome outcome = handle(*message);
+                error = std::move(outcome.error);
+                broadcasts = std::move(outcome.broadcasts);
+            } catch (const std::exception& failure) {
+                error = Failure(received, failure, false);
+            }
+        }
+        Answer(received, error);
+        SendBroadcasts(broadcasts);
+        Report(received, error);
+    });
+}
+
+template <typename Message, typename Response>
+void TagServiceEndpoint::OnRequest(
+    std::function<std::unique_ptr<Response>(const Received&, const Message&, Broadcasts&)>
+        answer) {
+    On(Message::kMessageName, [this, answer](const Received& received) {
+        std::optional<MessageError> error;
+        Broadcasts broadcasts;
+        std::unique_ptr<Response> response;
+        if (const auto message = Parse<Message>(received, error)) {
+            try {
+                response = answer(received, *message, broadcasts);
+            } catch (const std::exception& failure) {
+                error = Failure(received, failure, false);
+            }
+        }
+        if (!response) response = std::make_unique<Response>(received, *error);
+        Publish(*response);
+        SendBroadcasts(broadcasts);
+        Report(received, error);
+    });
+}
+
+void TagServiceEndpoint::Publish(MessageBus::MessageBase& message) {
+    try {
+        service_.Publish(message);
+    } catch (const std::exception& error) {
+        WriteLogLine(std::cerr, "cannot publish " + message.MessageType() + ": " + error.what());
+    }
+}
+
+void TagServiceEndpoint::Answer(const Received& received,
+                                const std::optional<MessageError>& error) {
+    try {
+        service_.SendResponse(received, error);
+    } catch (const std::exception& failure) {
+        WriteLogLine(std::cerr, "cannot answer " + received.MessageType() + ": " + failure.what());
+    }
+}
+
+void TagServiceEndpoint::SendBroadcasts(const Broadcasts& broadcasts) {
+    for (const auto& broadcast : broadcasts) Publish(*broadcast);
+}
+
+void TagServiceEndpoint::Report(const Received& received,
+                                const std::optional<MessageError>& error) {
+    if (!verbose_) return;
+    WriteLogLine(std::cout, received.MessageType() + " from " + received.Origin() + ": " +
+                                (error ? error->FullName() : std::string("ok")));
+}
+
+MessageError TagServiceEndpoint::Failure(const Received& received, const std::exception& error,
+                                         bool parsing) {
+    WriteLogLine(std::cerr, std::string(parsing ? "cannot parse " : "failed on ") +
+                                received.MessageType() + " from " + received.Origin() + ": " +
+                                error.what());
+    return ServiceError(parsing ? "Veldra.FailedToParse" : "Veldra.InternalServiceError");
+}
+
+}  // namespace Korvane::Veldra::TagService
