@@ -41,9 +41,15 @@ std::unique_ptr<TagService::TagStore> OpenStore(const std::string& file) {
     return std::make_unique<TagService::SqliteTagStore>(file);
 }
 
+// Where the configuration points, for the message of a failed start.
+std::string BrokerOf(const MessageBus::VeldraConfiguration& configuration) {
+    return configuration.Host.value_or("") + ":" + std::to_string(configuration.Port.value_or(0));
+}
+
 std::unique_ptr<MessageBus::AmqpConnectionManager> ManagerFor(
-    const TagService::ServiceOptions& options) {
+    const TagService::ServiceOptions& options, std::string& broker) {
     const auto entry = MessageBus::BusConfigurations::GetNamed(options.configurationId, true);
+    broker = BrokerOf(entry.Configuration) + " (configuration " + entry.Path + ")";
     auto manager = std::make_unique<MessageBus::AmqpConnectionManager>(entry.Configuration);
     manager->SetConnectTimeout(options.connectTimeoutMs);
     return manager;
@@ -63,16 +69,19 @@ int Run(const TagService::ServiceOptions& options) {
 
     std::unique_ptr<MessageBus::AmqpConnectionManager> manager;
     std::unique_ptr<TagService::TagServiceEndpoint> endpoint;
+    std::string broker;
     try {
-        manager = ManagerFor(options);
+        manager = ManagerFor(options, broker);
         endpoint = std::make_unique<TagService::TagServiceEndpoint>(*manager, logic,
                                                                     options.verbose);
     } catch (const MessageBus::VeldraException* error) {
         const std::unique_ptr<const MessageBus::VeldraException> owned(error);
-        WriteLogLine(std::cerr, std::string("cannot start on the bus: ") + error->what());
+        WriteLogLine(std::cerr, std::string("no broker configuration: ") + error->what());
         return kNoBroker;
     } catch (const std::exception& error) {
-        WriteLogLine(std::cerr, std::string("cannot start on the bus: ") + error.what());
+        WriteLogLine(std::cerr, broker.empty()
+                                    ? std::string("no broker configuration: ") + error.what()
+                                    : "cannot reach the broker " + broker + ": " + error.what());
         return kNoBroker;
     }
 
