@@ -24,14 +24,6 @@ void ConsoleLogger::Error(const std::string& text) {
     Print(nullptr, text, TraceEntryType::Error);
 }
 
-void ConsoleLogger::Error(const MessageBus::MessageError* error) {
-    if (error != nullptr) Error(ErrorEntryText(*error));
-}
-
-void ConsoleLogger::Assert(bool condition, const std::string& text) {
-    if (!condition) Error(text);
-}
-
 void ConsoleLogger::Print(const std::string* tracePointName, const std::string& text,
                           TraceEntryType type) const {
     TraceEntry entry;

@@ -29,12 +29,4 @@ void TraceLogger::Error(const std::string& text) {
     processLogger_->Take(name_, nullptr, text, TraceEntryType::Error);
 }
 
-void TraceLogger::Error(const MessageBus::MessageError* error) {
-    if (error != nullptr) Error(ErrorEntryText(*error));
-}
-
-void TraceLogger::Assert(bool condition, const std::string& text) {
-    if (!condition) Error(text);
-}
-
 }  // namespace Korvane::Veldra::VeldraUtilities::TraceLogging

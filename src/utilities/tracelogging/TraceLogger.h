@@ -20,8 +20,7 @@ public:
     void Log(const MessageBus::TracePoint& tracePoint, const std::string& text) override;
     void Info(const std::string& text) override;
     void Error(const std::string& text) override;
-    void Error(const MessageBus::MessageError* error) override;
-    void Assert(bool condition, const std::string& text) override;
+    using ITraceLogger::Error;
 
 private:
     const std::string name_;

@@ -9,7 +9,6 @@
 #include <utility>
 #include <vector>
 
-#include "messagelibrary/MessageError.h"
 #include "utilities/tracelogging/ITraceLogger.h"
 
 namespace Korvane::Veldra::MessageBus::Testing {
@@ -21,7 +20,6 @@ public:
     explicit RecordingTraceLogger(std::set<std::string> enabledPoints = {})
         : enabled_(std::move(enabledPoints)) {}
 
-    const std::string& GetName() const override { return name_; }
     TracePoint GetTracePoint(const std::string& name) override {
         TracePoint point(name);
         point.enabled = enabled_.count(name) != 0;
@@ -30,14 +28,7 @@ public:
     void Log(const TracePoint& point, const std::string& text) override {
         Add("LOG " + point.name + " | " + text);
     }
-    void Info(const std::string& text) override { Add("INFO " + text); }
     void Error(const std::string& text) override { Add("ERROR " + text); }
-    void Error(const MessageError* error) override {
-        if (error != nullptr) Add("ERROR " + error->FullName());
-    }
-    void Assert(bool condition, const std::string& text) override {
-        if (!condition) Error(text);
-    }
 
     std::vector<std::string> Entries() const {
         std::lock_guard<std::mutex> lock(mutex_);
@@ -61,7 +52,6 @@ private:
         added_.notify_all();
     }
 
-    const std::string name_ = "Recording";
     const std::set<std::string> enabled_;
     mutable std::mutex mutex_;
     std::condition_variable added_;
