@@ -22,6 +22,12 @@ public:
                                          const MessageBus::MessageBody& body);
 
     const std::optional<std::vector<TraceEntry>>& Entries() const { return entries_; }
+    // Moves the entries out, for a sender that reuses their storage.
+    std::vector<TraceEntry> TakeEntries() {
+        std::vector<TraceEntry> entries = entries_ ? std::move(*entries_) : std::vector<TraceEntry>();
+        entries_.reset();
+        return entries;
+    }
 
     MessageBus::MessageBody Serialize() const override;
 

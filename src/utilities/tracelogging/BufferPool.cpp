@@ -20,7 +20,7 @@ TraceEntryBuffer BufferPool::Take() {
 
 void BufferPool::Return(TraceEntryBuffer buffer) {
     buffer.clear();
-    // A vector whose storage went out with a message gets it back here, on the
+    // A vector whose storage was lost on the way gets it back here, on the
     // returning thread, so that Take never allocates for the caller.
     buffer.reserve(capacity_);
     std::lock_guard<std::mutex> lock(mutex_);

@@ -1,7 +1,5 @@
 #include "utilities/tracelogging/ConsoleLogger.h"
 
-#include <boost/date_time/posix_time/posix_time_types.hpp>
-
 #include <cstdio>
 
 #include "utilities/tracelogging/TraceText.h"
@@ -28,7 +26,7 @@ void ConsoleLogger::Print(const std::string* tracePointName, const std::string& 
                           TraceEntryType type) const {
     TraceEntry entry;
     entry.moduleName = name_;
-    entry.timestamp = boost::posix_time::microsec_clock::universal_time();
+    entry.timestamp = TraceTimeNow();
     if (tracePointName != nullptr) entry.tracePointName = *tracePointName;
     entry.text = text;
     entry.type = type;

@@ -1,7 +1,5 @@
 #include "utilities/tracelogging/ProcessLogger.h"
 
-#include <boost/date_time/posix_time/posix_time_types.hpp>
-
 #include <exception>
 #include <utility>
 
@@ -10,6 +8,7 @@
 #include "messagelibrary/tracelogger/TraceLoggerRegisterTracePointRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerSnapshotBroadcast.h"
 #include "messagelibrary/tracelogger/TraceLoggerStoreEntriesRoutedMessage.h"
+#include "utilities/tracelogging/TraceText.h"
 #include "utilities/tracelogging/UpdateTracePointsCallback.h"
 
 namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
@@ -55,7 +54,7 @@ void ProcessLogger::Stop() {
 void ProcessLogger::Take(const std::string& moduleName, const std::string* tracePointName,
                          const std::string& text, TraceEntryType type) {
     if (!accepting_.load(std::memory_order_relaxed)) return;
-    const auto now = boost::posix_time::microsec_clock::universal_time();
+    const auto now = TraceTimeNow();
     bool rotated = false;
     {
         std::lock_guard<std::mutex> lock(mutex_);
@@ -121,8 +120,8 @@ void ProcessLogger::SendBuffers(std::deque<TraceEntryBuffer>& buffers) {
         buffers.pop_front();
         if (!buffer.empty()) {
             Messages::TraceLoggerStoreEntriesRoutedMessage message(std::move(buffer));
-            buffer = TraceEntryBuffer();
             PublishQuietly(message);
+            buffer = message.TakeEntries();
         }
         pool_->Return(std::move(buffer));
     }

@@ -1,10 +1,19 @@
 #include "utilities/tracelogging/TraceText.h"
 
+#include <ctime>
+
 #include "messagelibrary/json/Timestamp.h"
 
 namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
 
 namespace Messages = VeldraMessageLibrary::TraceLoggerMessages;
+
+VeldraMessageLibrary::Timestamp TraceTimeNow() {
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    const int64_t micros = static_cast<int64_t>(now.tv_sec) * 1000000 + now.tv_nsec / 1000;
+    return VeldraMessageLibrary::TimestampFromTicks(VeldraMessageLibrary::kUnixEpochTicks + micros);
+}
 
 std::string ChildLoggerName(const std::string& parent, const std::string& name) {
     std::string full;
