@@ -128,10 +128,11 @@ public:
 private:
     // Prints a verbose progress line that carries a tag path.
     void Trace(const char* format, const std::string& path) const;
-    // Steps 2 and 3 of both send paths: publish, hand out the time-out, and
-    // on failure take the request back out.
+    // What both send paths share: file the request, send, hand out the
+    // time-out, and on failure take the request back out.
     template <typename Send>
-    int32_t SendFiled(uint32_t requestId, Send send, uint32_t& timeoutMs, std::string& error);
+    int32_t FileAndSend(const std::shared_ptr<AsyncRequest>& request, Send send,
+                        uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
     // Stops the logging thread and releases the service, then the logger.
     void ShutdownBus() noexcept;
 

@@ -87,13 +87,17 @@ uint32_t Client::RequestTimeoutMs() const {
 }
 
 template <typename Send>
-int32_t Client::SendFiled(uint32_t requestId, Send send, uint32_t& timeoutMs, std::string& error) {
+int32_t Client::FileAndSend(const std::shared_ptr<AsyncRequest>& request, Send send,
+                            uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
+    // Filed before the send: the reply cannot come before its request is.
+    requestId = requestMap_->Add(request);
+    if (requestId == 0) return ReportError("Tag.InvalidState", error);
     try {
         if (!messageService_) {
             requestMap_->Take(requestId);
             return ReportError("Tag.InvalidState", error);
         }
-        send(*messageService_);
+        send(*messageService_, requestId);
         timeoutMs = messageService_->DefaultTimeoutMs();
         return 0;
     } catch (const MessageBus::VeldraException& exception) {
@@ -108,31 +112,28 @@ int32_t Client::SendFiled(uint32_t requestId, Send send, uint32_t& timeoutMs, st
 int32_t Client::SendTrackedRequest(MessageBus::MessageBase& message,
                                    const std::shared_ptr<AsyncRequest>& request,
                                    uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
-    requestId = requestMap_->Add(request);
-    if (requestId == 0) return ReportError("Tag.InvalidState", error);
-    const uint32_t state = requestId;
-    return SendFiled(
-        requestId,
-        [&](MessageBus::MessageService& service) { service.SendRequestAsync(message, state, true); },
-        timeoutMs, error);
+    return FileAndSend(
+        request,
+        [&](MessageBus::MessageService& service, uint32_t state) {
+            // The response finds the callback by its message name.
+            service.SendRequestAsync(message, state, true);
+        },
+        requestId, timeoutMs, error);
 }
 
 int32_t Client::SendTrackedRouted(MessageBus::MessageBase& message,
                                   const std::shared_ptr<AsyncRequest>& request,
                                   uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
-    requestId = requestMap_->Add(request);
-    if (requestId == 0) return ReportError("Tag.InvalidState", error);
-    const uint32_t state = requestId;
-    return SendFiled(
-        requestId,
-        [&](MessageBus::MessageService& service) {
+    return FileAndSend(
+        request,
+        [&](MessageBus::MessageService& service, uint32_t state) {
             // The reply, a GenericResponse, goes straight to the callback by
             // the correlation id: routed messages have no response name.
             service.Subscriber()->RegisterCorrelationCallback(message.CorrelationId(),
                                                               responseCallback_, state);
             service.SendRouted(message, false);
         },
-        timeoutMs, error);
+        requestId, timeoutMs, error);
 }
 
 int32_t Client::TakeFinishedRequest(uint32_t requestId, std::shared_ptr<AsyncRequest>& request,

@@ -35,11 +35,16 @@ TEST(AsyncRequestMapTest, TakeRemoves) {
     EXPECT_EQ(map.Size(), 0u);
 }
 
-TEST(AsyncResponseCallbackTest, RepliesCompleteFiledRequestsAndLateOnesAreDropped) {
-    const auto map = std::make_shared<AsyncRequestMap>();
-    GenericAsyncResponseCallback callback(map);
-    const auto request = MakeConsoleAsyncRequest();
+// One console request filed in a map, as after a start half.
+class AsyncResponseCallbackTest : public ::testing::Test {
+protected:
+    const std::shared_ptr<AsyncRequestMap> map = std::make_shared<AsyncRequestMap>();
+    const std::shared_ptr<AsyncRequest> request = MakeConsoleAsyncRequest();
     const uint32_t id = map->Add(request);
+};
+
+TEST_F(AsyncResponseCallbackTest, RepliesCompleteFiledRequestsAndLateOnesAreDropped) {
+    GenericAsyncResponseCallback callback(map);
     callback.OnResponse(Reply("GenericResponse"), id);
     EXPECT_NE(request->Response(), nullptr);
     EXPECT_EQ(map->Size(), 1u);  // stays for the finish
@@ -50,20 +55,17 @@ TEST(AsyncResponseCallbackTest, RepliesCompleteFiledRequestsAndLateOnesAreDroppe
     EXPECT_EQ(map->Size(), 0u);
 }
 
-TEST(AsyncResponseCallbackTest, AReplyForAnAbandonedHostSignalDropsTheEntry) {
-    const auto map = std::make_shared<AsyncRequestMap>();
+TEST_F(AsyncResponseCallbackTest, AReplyForAnAbandonedHostSignalDropsTheEntry) {
     uint32_t signal = 0;
-    const uint32_t id = map->Add(MakeWBAsyncRequest(signal));
+    const uint32_t hostId = map->Add(MakeWBAsyncRequest(signal));
     ASSERT_EQ(WBFreeSignal(signal), 0);
-    GenericAsyncResponseCallback(map).OnResponse(Reply("GenericResponse"), id);
-    EXPECT_EQ(map->Take(id), nullptr);
+    GenericAsyncResponseCallback(map).OnResponse(Reply("GenericResponse"), hostId);
+    EXPECT_EQ(map->Take(hostId), nullptr);
+    EXPECT_EQ(map->Take(id), request);  // other entries are not touched
 }
 
-TEST(AsyncResponseCallbackTest, TheIgnoringCallbackPassesOnlyFailures) {
-    const auto map = std::make_shared<AsyncRequestMap>();
+TEST_F(AsyncResponseCallbackTest, TheIgnoringCallbackPassesOnlyFailures) {
     IgnoringAsyncResponseCallback callback(map);
-    const auto request = MakeConsoleAsyncRequest();
-    const uint32_t id = map->Add(request);
     callback.OnResponse(Reply("GenericResponse"), id);
     EXPECT_EQ(request->Response(), nullptr);
     callback.OnResponse(ErrorReply("Tag.InvalidState"), id);
