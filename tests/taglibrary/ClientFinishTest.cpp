@@ -141,10 +141,5 @@ TEST_F(ClientFinishTest, AnUnreadableLookupReplyGoesUp) {
     EXPECT_ANY_THROW(Open(id, TagDataType::Int));
 }
 
-TEST_F(ClientFinishTest, TheRequestTimeOutIsTheServiceDefault) {
-    EXPECT_EQ(client.RequestTimeoutMs(), 10000u);
-    EXPECT_EQ(client.ConnectTimeoutMs(), 5000u);
-}
-
 }  // namespace
 }  // namespace Korvane::Veldra::TagLibrary::Testing

@@ -117,11 +117,5 @@ TEST_F(ProcessLoggerTest, PointsAreAnnouncedOnceAndSnapshotsChangeNone) {
     EXPECT_EQ(after.times, "<unset>");
 }
 
-TEST_F(ProcessLoggerTest, TheLoggingThreadHasAStackOfWholePages) {
-    const std::size_t size = StackSizedThread::RoundedStackSize(ProcessLogger::kThreadStackBytes + 1);
-    EXPECT_GT(size, ProcessLogger::kThreadStackBytes);
-    EXPECT_EQ(size % 4096, 0u);
-}
-
 }  // namespace
 }  // namespace Korvane::Veldra::VeldraUtilities::TraceLogging::Testing
