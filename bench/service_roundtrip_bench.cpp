@@ -30,6 +30,7 @@
 #include "messagebus/service/MessageService.h"
 #include "messagebus/concurrency/Semaphore.h"
 #include "messagelibrary/RequestMessage.h"
+#include "support/BenchBroker.h"
 
 namespace {
 
@@ -42,41 +43,8 @@ constexpr int kPipelineWindow = 32;  // requests in flight per thread
 constexpr int kPipelinePerThread = 5000;
 constexpr int kReplyTimeoutMs = 5000;
 
-// ---- The broker of the test harness ----
-
-struct BrokerAddress {
-    std::string host, user, password;
-    int port = 0;
-};
-
-std::string DefaultEnvFile() {
-    char exe[4096];
-    const ssize_t length = readlink("/proc/self/exe", exe, sizeof(exe) - 1);
-    if (length <= 0) return std::string();
-    std::string path(exe, static_cast<size_t>(length));
-    path = path.substr(0, path.rfind('/'));  // <build>/bench
-    return path.substr(0, path.rfind('/')) + "/tests/integration/broker/broker.env";
-}
-
-// Reads the KEY='value' lines the harness writes; null when there is no file.
-std::optional<BrokerAddress> LoadBroker(std::string& path) {
-    const char* fromEnv = std::getenv("KVVELDRA_BROKER_ENV");
-    path = fromEnv != nullptr && *fromEnv != '\0' ? fromEnv : DefaultEnvFile();
-    std::ifstream file(path);
-    if (!file) return std::nullopt;
-    std::map<std::string, std::string> values;
-    for (std::string line; std::getline(file, line);) {
-        const auto equals = line.find('=');
-        if (equals == std::string::npos) continue;
-        std::string value = line.substr(equals + 1);
-        if (value.size() >= 2 && value.front() == '\'') value = value.substr(1, value.size() - 2);
-        values[line.substr(0, equals)] = value;
-    }
-    BrokerAddress broker{values["BROKER_HOST"], values["BROKER_USER"], values["BROKER_PASSWORD"],
-                         std::atoi(values["BROKER_AMQP_PORT"].c_str())};
-    if (broker.host.empty() || broker.port == 0) return std::nullopt;
-    return broker;
-}
+using Korvane::Veldra::Bench::BrokerAddress;
+using Korvane::Veldra::Bench::LoadBroker;
 
 // ---- Directly on rabbitmq-c ----
 
@@ -231,13 +199,7 @@ private:
 };
 
 std::unique_ptr<Bus::AmqpConnectionManager> MakeManager(const BrokerAddress& broker) {
-    Bus::VeldraConfiguration configuration;
-    configuration.Host = broker.host;
-    configuration.Port = broker.port;
-    configuration.User = broker.user;
-    configuration.Password = broker.password;
-    configuration.ExchangeName = "kvveldra.bench.service";
-    return std::make_unique<Bus::AmqpConnectionManager>(configuration);
+    return Korvane::Veldra::Bench::MakeManager(broker, "kvveldra.bench.service");
 }
 
 Bus::MessageServiceSettings Settings(Bus::AmqpConnectionManager& manager, const char* name) {
