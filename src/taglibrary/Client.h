@@ -137,9 +137,9 @@ private:
     void ShutdownBus() noexcept;
 
     std::atomic<bool> verbose_;
-    // Declared so that, should construction fail half-way, the members go in
-    // an order that is safe for the bus: the service's threads end before the
-    // callback and the manager that they use.
+    // Declared so that the members left after ShutdownBus go in an order that
+    // is safe for the bus: the service's threads end before the callback and
+    // the manager that they use.
     std::shared_ptr<AsyncRequestMap> requestMap_;
     std::shared_ptr<MessageBus::AmqpConnectionManager> connectionManager_;
     std::shared_ptr<GenericAsyncResponseCallback> responseCallback_;
