@@ -97,7 +97,9 @@ void AddToAggregates(TagAggregates& aggregates, TagDataType type, const std::str
         canonical = first == std::string::npos ? "0" : canonical.substr(first);
     }
     aggregates.count += 1;
-    aggregates.avg += (value - aggregates.avg) / aggregates.count;
+    // Weighted, so that no intermediate sum leaves the range of a double.
+    const double weight = 1.0 / aggregates.count;
+    aggregates.avg = aggregates.avg * (1.0 - weight) + value * weight;
     if (!aggregates.min || Compare(type, canonical, *aggregates.min) < 0) aggregates.min = canonical;
     if (!aggregates.max || Compare(type, canonical, *aggregates.max) > 0) aggregates.max = canonical;
 }

@@ -75,12 +75,19 @@ std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string&
 }
 
 const std::string& UseBrokerDataRoot() {
-    static const std::string root = [] {
-        std::string directory = WriteBrokerDataRoot(Broker(), MakeTempDirectory("kvveldra-data"));
-        setenv("VELDRA_DATA_DIR", directory.c_str(), 1);
-        return directory;
-    }();
-    return root;
+    // Made on first use, removed when the process ends.
+    struct DataRoot {
+        DataRoot() : path(WriteBrokerDataRoot(Broker(), MakeTempDirectory("kvveldra-data"))) {
+            setenv("VELDRA_DATA_DIR", path.c_str(), 1);
+        }
+        ~DataRoot() {
+            std::error_code ignored;
+            std::filesystem::remove_all(path, ignored);
+        }
+        std::string path;
+    };
+    static const DataRoot root;
+    return root.path;
 }
 
 TagServiceProcess::TagServiceProcess(Options options) {
@@ -118,6 +125,7 @@ TagServiceProcess::TagServiceProcess(Options options) {
     reader_ = std::thread([this, fd = pipeFds[0]] { ReadOutput(fd); });
     if (!WaitForOutput(kReadyLine, kReadyTimeout)) {
         Kill();
+        reader_.join();  // the output ends with the child
         throw std::runtime_error("kvveldra-tagservice did not print its ready line; its output:\n" +
                                  Output());
     }

@@ -5,7 +5,6 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
-#include <atomic>
 #include <filesystem>
 #include <mutex>
 #include <set>
@@ -45,6 +44,18 @@ public:
         std::unique_lock<std::mutex> lock(mutex_);
         return changed_.wait_for(lock, timeout, [&] { return acked_.size() >= count; });
     }
+    // For the sender: true once count writes are acknowledged, false once
+    // Stop was called.
+    bool AwaitAcksUnlessStopped(std::size_t count) {
+        std::unique_lock<std::mutex> lock(mutex_);
+        changed_.wait(lock, [&] { return acked_.size() >= count || stopped_; });
+        return !stopped_;
+    }
+    void Stop() {
+        std::lock_guard<std::mutex> lock(mutex_);
+        stopped_ = true;
+        changed_.notify_all();
+    }
     std::set<uint32_t> Acked() {
         std::lock_guard<std::mutex> lock(mutex_);
         return acked_;
@@ -54,6 +65,7 @@ private:
     std::mutex mutex_;
     std::condition_variable changed_;
     std::set<uint32_t> acked_;
+    bool stopped_ = false;
 };
 
 TEST(TagServiceProcessTest, ARestartOnTheSameStoreServesTheSameTags) {
@@ -116,11 +128,13 @@ TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     auto service = std::make_unique<TagServiceProcess>(options);
     client.Create("kill.seq", TagDataType::Int, true);
 
+    // A stream of writes with up to kWindow of them unacknowledged at a time.
+    constexpr uint32_t kWindow = 50;
     AckCounter acks;
     client.Service().SetStateResponseCallback(&acks);
-    std::atomic<bool> sending{true};
     std::thread sender([&] {
-        for (uint32_t i = 1; sending && i < 1000000; ++i) {
+        for (uint32_t i = 1; i < 1000000; ++i) {
+            if (i > kWindow && !acks.AwaitAcksUnlessStopped(i - kWindow)) return;
             Tags::TagIngestionMessages::TagUpdateValuesRoutedMessage write(
                 std::vector<Tags::TagPathUpdates>{
                     {std::string("kill.seq"),
@@ -135,7 +149,7 @@ TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     });
     const bool enough = acks.WaitForAcks(300, std::chrono::seconds(60));
     service->Kill();
-    sending = false;
+    acks.Stop();
     sender.join();
     ASSERT_TRUE(enough) << service->Output();
     const std::set<uint32_t> acked = acks.Acked();
