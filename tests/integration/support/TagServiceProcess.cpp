@@ -14,6 +14,7 @@
 
 #include "messagebus/config/VeldraConfiguration.h"
 #include "support/BrokerEnvironment.h"
+#include "support/ScratchDirectory.h"
 
 extern char** environ;
 
@@ -23,16 +24,6 @@ namespace {
 constexpr auto kReadyTimeout = std::chrono::seconds(30);
 constexpr auto kStopTimeout = std::chrono::seconds(30);
 constexpr const char* kReadyLine = "kvveldra-tagservice ready";
-
-std::string MakeTempDirectory(const std::string& stem) {
-    const char* tmp = std::getenv("TMPDIR");
-    std::string pattern = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/" + stem +
-                          ".XXXXXX";
-    if (mkdtemp(pattern.data()) == nullptr) {
-        throw std::runtime_error("mkdtemp " + pattern + ": " + std::strerror(errno));
-    }
-    return pattern;
-}
 
 // The environment of the child: ours with VELDRA_DATA_DIR replaced.
 std::vector<std::string> ChildEnvironment(const std::string& dataRoot) {
@@ -77,17 +68,14 @@ std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string&
 const std::string& UseBrokerDataRoot() {
     // Made on first use, removed when the process ends.
     struct DataRoot {
-        DataRoot() : path(WriteBrokerDataRoot(Broker(), MakeTempDirectory("kvveldra-data"))) {
-            setenv("VELDRA_DATA_DIR", path.c_str(), 1);
+        DataRoot() {
+            WriteBrokerDataRoot(Broker(), directory.Path());
+            setenv("VELDRA_DATA_DIR", directory.Path().c_str(), 1);
         }
-        ~DataRoot() {
-            std::error_code ignored;
-            std::filesystem::remove_all(path, ignored);
-        }
-        std::string path;
+        ScratchDirectory directory{"kvveldra-data"};
     };
     static const DataRoot root;
-    return root.path;
+    return root.directory.Path();
 }
 
 TagServiceProcess::TagServiceProcess(Options options) {

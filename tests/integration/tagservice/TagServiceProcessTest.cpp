@@ -14,23 +14,13 @@
 #include "messagelibrary/taginfo/TagInfoDeleteTagsRoutedMessage.h"
 #include "support/BrokerEnvironment.h"
 #include "support/CommandRunner.h"
+#include "support/ScratchDirectory.h"
 #include "tagservice/TagServiceClient.h"
 
 namespace Korvane::Veldra::Testing {
 namespace {
 
 using Tags::TagDataType;
-
-// A fresh directory under $TMPDIR, removed at the end.
-struct ScratchDirectory {
-    ScratchDirectory() {
-        const char* tmp = std::getenv("TMPDIR");
-        path = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/kvveldra-ts.XXXXXX";
-        if (mkdtemp(path.data()) == nullptr) throw std::runtime_error("mkdtemp failed");
-    }
-    ~ScratchDirectory() { std::filesystem::remove_all(path); }
-    std::string path;
-};
 
 // Counts the replies to writes that came back without an error, by state.
 class AckCounter : public MessageBus::Interfaces::IResponseCallback {
@@ -71,7 +61,7 @@ private:
 TEST(TagServiceProcessTest, ARestartOnTheSameStoreServesTheSameTags) {
     ScratchDirectory scratch;
     TagServiceProcess::Options options;
-    options.store = scratch.path + "/tags.db";
+    options.store = scratch.Path() + "/tags.db";
     TagServiceClient client;
     const auto at = Tags::Timestamp(boost::gregorian::date(2020, 1, 2),
                                     boost::posix_time::seconds(3));
@@ -123,7 +113,7 @@ TEST(TagServiceProcessTest, ARestartOnTheSameStoreServesTheSameTags) {
 TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     ScratchDirectory scratch;
     TagServiceProcess::Options options;
-    options.store = scratch.path + "/tags.db";
+    options.store = scratch.Path() + "/tags.db";
     TagServiceClient client;
     auto service = std::make_unique<TagServiceProcess>(options);
     client.Create("kill.seq", TagDataType::Int, true);
@@ -189,10 +179,10 @@ TEST(TagServiceProcessTest, ABrokerItCannotReachEndsItWithStatusTwo) {
     ScratchDirectory scratch;
     BrokerSettings nowhere = Broker();
     nowhere.AmqpPort = ClosedPort();
-    WriteBrokerDataRoot(nowhere, scratch.path);
+    WriteBrokerDataRoot(nowhere, scratch.Path());
     const auto started = std::chrono::steady_clock::now();
     const CommandResult result =
-        RunCommand({"env", "VELDRA_DATA_DIR=" + scratch.path, KVVELDRA_TAGSERVICE_PATH,
+        RunCommand({"env", "VELDRA_DATA_DIR=" + scratch.Path(), KVVELDRA_TAGSERVICE_PATH,
                     "--connect-timeout", "2000"},
                    60);
     EXPECT_EQ(result.ExitCode, 2) << result.Output;
@@ -204,7 +194,7 @@ TEST(TagServiceProcessTest, AStoreThatCannotBeOpenedEndsItWithStatusThree) {
     ScratchDirectory scratch;
     const CommandResult result = RunCommand(
         {"env", "VELDRA_DATA_DIR=" + UseBrokerDataRoot(), KVVELDRA_TAGSERVICE_PATH, "--store",
-         scratch.path + "/no/such/dir/tags.db"},
+         scratch.Path() + "/no/such/dir/tags.db"},
         60);
     EXPECT_EQ(result.ExitCode, 3) << result.Output;
 }

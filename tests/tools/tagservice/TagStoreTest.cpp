@@ -1,12 +1,11 @@
 #include <gtest/gtest.h>
-#include <stdlib.h>
-
 #include <filesystem>
 #include <memory>
 
 #include "MemoryTagStore.h"
 #include "SqliteTagStore.h"
 #include "StoredTagJson.h"
+#include "support/ScratchDirectory.h"
 
 namespace Korvane::Veldra::TagService {
 namespace {
@@ -20,18 +19,13 @@ StoredTag Tag(const std::string& path, Tags::TagDataType type) {
     return tag;
 }
 
+// A store file in a scratch directory.
 class ScratchFile {
 public:
-    ScratchFile() {
-        const char* tmp = getenv("TMPDIR");
-        directory_ = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/kvts.XXXXXX";
-        if (mkdtemp(directory_.data()) == nullptr) throw std::runtime_error("mkdtemp");
-    }
-    ~ScratchFile() { std::filesystem::remove_all(directory_); }
-    std::string Path() const { return directory_ + "/tags.db"; }
+    std::string Path() const { return directory_.Path() + "/tags.db"; }
 
 private:
-    std::string directory_;
+    Testing::ScratchDirectory directory_{"kvts"};
 };
 
 // Both stores keep the same contract.
