@@ -123,6 +123,7 @@ void TagServiceEndpoint::OnRouted(std::function<Outcome(const Message&)> handle)
         Broadcasts broadcasts;
         if (const auto message = Parse<Message>(received, error)) {
             try {
+                std::lock_guard<std::mutex> lock(logicMutex_);
                 Outcome outcome = handle(*message);
                 error = std::move(outcome.error);
                 broadcasts = std::move(outcome.broadcasts);
@@ -146,6 +147,7 @@ void TagServiceEndpoint::OnRequest(
         std::unique_ptr<Response> response;
         if (const auto message = Parse<Message>(received, error)) {
             try {
+                std::lock_guard<std::mutex> lock(logicMutex_);
                 response = answer(received, *message, broadcasts);
             } catch (const std::exception& failure) {
                 error = Failure(received, failure, false);

@@ -60,6 +60,7 @@ private:
                                      bool parsing);
 
     TagServiceLogic& logic_;
+    std::mutex logicMutex_;  // the rules and their store are not thread-safe
     const bool verbose_;
     MessageBus::MessageService service_;
 };
