@@ -12,6 +12,7 @@
 
 #include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsRequest.h"
 #include "messagelibrary/taginfo/TagInfoDeleteTagsRoutedMessage.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsRequest.h"
 #include "support/BrokerEnvironment.h"
 #include "support/CommandRunner.h"
 #include "support/ScratchDirectory.h"
@@ -154,6 +155,30 @@ TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     // is at least the newest acknowledged one.
     EXPECT_GE(static_cast<std::size_t>(values[0].aggregates->count), acked.size());
     EXPECT_GE(std::stoul(*values[0].current->value->value), *acked.rbegin());
+}
+
+TEST(TagServiceProcessTest, ItServesAgainAfterTheBrokerDropsItsConnections) {
+    TagServiceProcess service;
+    TagServiceClient client;
+    client.Create("reconnect.a", TagDataType::Int);
+    ASSERT_TRUE(CloseAllConnections());
+    // Both sides reconnect by themselves: ask, each time with a bounded wait,
+    // until an answer comes.
+    MessagePtr reply;
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(90);
+    while (reply == nullptr && std::chrono::steady_clock::now() < deadline) {
+        Tags::TagInfoMessages::TagInfoQueryTagsRequest query(
+            Tags::JsonStringList{"reconnect.a"}, std::nullopt, std::nullopt, 0, 0, true);
+        try {
+            reply = client.Service().SendRequest(query, 2000);
+        } catch (const std::exception&) {
+            // The client's publisher is still reconnecting.
+        }
+    }
+    ASSERT_NE(reply, nullptr) << service.Output();
+    Tags::TagInfoMessages::TagInfoQueryTagsResponse page(reply->Headers(), reply->Body());
+    EXPECT_EQ(page.TotalCount(), 1);
+    EXPECT_NE(service.Output().find("bus: "), std::string::npos) << service.Output();
 }
 
 TEST(TagServiceProcessTest, SigtermStopsItCleanly) {
