@@ -62,6 +62,7 @@ int Compare(TagDataType type, const std::string& a, const std::string& b) {
 }  // namespace
 
 bool CanReadValue(TagDataType type, const std::string& text) {
+    if (text.find('\0') != std::string::npos) return false;
     try {
         switch (type) {
             case TagDataType::Double: TagLibrary::ParseDouble(text); return true;
@@ -70,8 +71,7 @@ bool CanReadValue(TagDataType type, const std::string& text) {
             case TagDataType::UInt64: return ReadsAsUInt64(text);
             case TagDataType::DateTime: {
                 VeldraMessageLibrary::Timestamp parsed;
-                return text.find('\0') == std::string::npos &&
-                       VeldraMessageLibrary::ParseTimestampZ(text.c_str(), parsed);
+                return VeldraMessageLibrary::ParseTimestampZ(text.c_str(), parsed);
             }
             case TagDataType::String: return true;
             default: return false;
@@ -96,6 +96,7 @@ void AddToAggregates(TagAggregates& aggregates, TagDataType type, const std::str
         const auto first = canonical.find_first_not_of('0');
         canonical = first == std::string::npos ? "0" : canonical.substr(first);
     }
+    if (aggregates.count == std::numeric_limits<int32_t>::max()) return;  // saturated
     aggregates.count += 1;
     // Weighted, so that no intermediate sum leaves the range of a double.
     const double weight = 1.0 / aggregates.count;

@@ -11,6 +11,7 @@ TEST(TagPathRulesTest, NewPathsAreRefusedByTheFirstRuleTheyBreak) {
     EXPECT_EQ(NewTagPathError("*"), "Tag.TagPathCannotContainAWildcard");
     EXPECT_EQ(NewTagPathError(" . .\t"), "Tag.TagPathCannotContainOnlyWhiteSpaceAndDots");
     EXPECT_EQ(NewTagPathError("..."), "Tag.TagPathCannotContainOnlyWhiteSpaceAndDots");
+    EXPECT_EQ(NewTagPathError(std::string("a\0b", 3)), "Tag.InvalidTagPath");
     EXPECT_EQ(NewTagPathError(" a. "), std::nullopt);
     EXPECT_EQ(NewTagPathError("Zone/\xc3\xa9t\xc3\xa9.1"), std::nullopt);
 }

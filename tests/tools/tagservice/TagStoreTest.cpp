@@ -90,6 +90,21 @@ TEST(SqliteTagStoreTest, AReopenedFileReadsBackWhatItWasGiven) {
     EXPECT_EQ(read->current->timestamp, tag.current->timestamp);
 }
 
+// The times a message can carry; +infinity cannot, its text reads back as
+// the last microsecond of 9999.
+TEST(StoredTagJsonTest, ExtremeTimesReadBack) {
+    using boost::posix_time::ptime;
+    for (const Tags::Timestamp time :
+         {ptime(boost::posix_time::neg_infin),
+          ptime(boost::gregorian::date(9999, 12, 31), boost::posix_time::microseconds(86399999999)),
+          ptime(boost::gregorian::date(1400, 1, 1))}) {
+        StoredTag tag = Tag("t", Tags::TagDataType::DateTime);
+        tag.current = Tags::TagValueSample{time, Tags::TagValue{Tags::TagDataType::DateTime, "x"}};
+        const StoredTag read = StoredTagFromJson(StoredTagToJson(tag));
+        EXPECT_EQ(StoredTagToJson(read), StoredTagToJson(tag));
+    }
+}
+
 TEST(SqliteTagStoreTest, AFileThatIsNotAStoreIsRefusedWithItsReason) {
     ScratchFile file;
     {

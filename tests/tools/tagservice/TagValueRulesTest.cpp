@@ -34,7 +34,8 @@ TEST(TagValueRulesTest, EachTypeReadsItsOwnTexts) {
     EXPECT_FALSE(CanReadValue(TagDataType::DateTime, "2016-13-01T12:00:00Z"));
     EXPECT_FALSE(CanReadValue(TagDataType::DateTime, "yesterday"));
 
-    EXPECT_TRUE(CanReadValue(TagDataType::String, std::string("\0any", 4)));
+    EXPECT_TRUE(CanReadValue(TagDataType::String, "any text \xc3\xa9"));
+    EXPECT_FALSE(CanReadValue(TagDataType::String, std::string("a\0b", 3)));
     EXPECT_FALSE(CanReadValue(TagDataType::None, "1"));
 }
 
