@@ -2,6 +2,7 @@
 
 #include <fcntl.h>
 #include <signal.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -102,6 +103,10 @@ TagServiceProcess::TagServiceProcess(Options options) {
         dup2(devNull, STDIN_FILENO);
         dup2(pipeFds[1], STDOUT_FILENO);
         dup2(pipeFds[1], STDERR_FILENO);
+        // Nothing else of this process, its broker connections least of all.
+        if (syscall(SYS_close_range, 3U, ~0U, 0U) != 0) {
+            for (int fd = 3; fd < 65536; ++fd) close(fd);
+        }
         execve(argv[0], argv.data(), envp.data());
         _exit(127);
     }
