@@ -105,6 +105,16 @@ TEST(StoredTagJsonTest, ExtremeTimesReadBack) {
     }
 }
 
+TEST(SqliteTagStoreTest, ASecondStoreOnAFileInUseIsRefused) {
+    ScratchFile file;
+    SqliteTagStore first(file.Path());
+    EXPECT_THROW(SqliteTagStore second(file.Path()), StoreError);
+    StoreBatch batch;
+    batch.put = {Tag("still", Tags::TagDataType::Int)};
+    first.Apply(batch);
+    EXPECT_NE(first.Find("still"), nullptr);
+}
+
 TEST(SqliteTagStoreTest, AFileThatIsNotAStoreIsRefusedWithItsReason) {
     ScratchFile file;
     {
