@@ -31,7 +31,7 @@ bool ReadsAsBool(const std::string& text) {
     return false;
 }
 
-// The value of a numeric text as a double, with its canonical text.
+// The value of a numeric text as a double.
 double NumericValue(TagDataType type, const std::string& text) {
     switch (type) {
         case TagDataType::Double: return TagLibrary::ParseDouble(text);
@@ -40,15 +40,21 @@ double NumericValue(TagDataType type, const std::string& text) {
     }
 }
 
+// The text of the value as the service writes it: 17 digits for a double,
+// plain decimal digits without leading zeros for the integers.
 std::string CanonicalText(TagDataType type, const std::string& text) {
     switch (type) {
         case TagDataType::Double: return TagLibrary::FormatDouble(TagLibrary::ParseDouble(text));
         case TagDataType::Int: return std::to_string(TagLibrary::ParseInt(text));
-        default: return text;
+        default: {
+            const auto first = text.find_first_not_of('0');
+            return first == std::string::npos ? "0" : text.substr(first);
+        }
     }
 }
 
-// -1, 0 or 1 as a compares with b; texts of UInt64 compare exactly as numbers.
+// -1, 0 or 1 as a compares with b, both canonical texts; those of UInt64
+// compare exactly, as digit strings.
 int Compare(TagDataType type, const std::string& a, const std::string& b) {
     if (type == TagDataType::UInt64) {
         if (a.size() != b.size()) return a.size() < b.size() ? -1 : 1;
@@ -90,12 +96,7 @@ void AddToAggregates(TagAggregates& aggregates, TagDataType type, const std::str
     if (!IsNumericType(type)) return;
     const double value = NumericValue(type, text);
     if (!std::isfinite(value)) return;
-    // UInt64 keeps its digits as given, without leading zeros beyond one.
-    std::string canonical = CanonicalText(type, text);
-    if (type == TagDataType::UInt64) {
-        const auto first = canonical.find_first_not_of('0');
-        canonical = first == std::string::npos ? "0" : canonical.substr(first);
-    }
+    const std::string canonical = CanonicalText(type, text);
     if (aggregates.count == std::numeric_limits<int32_t>::max()) return;  // saturated
     aggregates.count += 1;
     // Weighted, so that no intermediate sum leaves the range of a double.
