@@ -44,7 +44,7 @@ constexpr int kPipelinePerThread = 5000;
 constexpr int kReplyTimeoutMs = 5000;
 
 using Korvane::Veldra::Bench::BrokerAddress;
-using Korvane::Veldra::Bench::LoadBroker;
+using Korvane::Veldra::Bench::BrokerOrSkip;
 
 // ---- Directly on rabbitmq-c ----
 
@@ -420,15 +420,8 @@ void PrintRatios() {
 }  // namespace
 
 int main(int argc, char** argv) {
-    std::string envFile;
-    g_broker = LoadBroker(envFile);
-    if (!g_broker) {
-        std::printf(
-            "service_roundtrip_bench: skipped, no test broker described in %s (start one with "
-            "tests/integration/broker/broker.sh start FILE and set KVVELDRA_BROKER_ENV=FILE)\n",
-            envFile.c_str());
-        return 0;
-    }
+    g_broker = BrokerOrSkip("service_roundtrip_bench");
+    if (!g_broker) return 0;
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
     try {

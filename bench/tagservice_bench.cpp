@@ -10,10 +10,7 @@
 // (<build>/tests/integration/broker/broker.env); without a broker the
 // benchmark says so and does nothing.
 #include <benchmark/benchmark.h>
-#include <stdlib.h>
-
 #include <cstdio>
-#include <filesystem>
 #include <memory>
 #include <string>
 #include <vector>
@@ -25,6 +22,7 @@
 #include "messagelibrary/HeaderKeys.h"
 #include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
 #include "support/BenchBroker.h"
+#include "support/ScratchDirectory.h"
 
 namespace {
 
@@ -37,21 +35,6 @@ constexpr uint32_t kReplyTimeoutMs = 30000;
 constexpr int kQueryTags = 10000;
 
 std::optional<Bench::BrokerAddress> g_broker;
-
-// A directory under $TMPDIR for the SQLite file, removed at the end.
-class ScratchDirectory {
-public:
-    ScratchDirectory() {
-        const char* tmp = getenv("TMPDIR");
-        path_ = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/kvts-bench.XXXXXX";
-        if (mkdtemp(path_.data()) == nullptr) throw std::runtime_error("mkdtemp failed");
-    }
-    ~ScratchDirectory() { std::filesystem::remove_all(path_); }
-    const std::string& Path() const { return path_; }
-
-private:
-    std::string path_;
-};
 
 // The service over a fresh store, and a client. One at a time: two services
 // on one exchange would both answer.
@@ -78,7 +61,7 @@ struct World {
         logic.CreateTag(Tags::TagInfoMessages::TagInfoCreateTagRoutedMessage(record));
     }
 
-    ScratchDirectory scratch;
+    Testing::ScratchDirectory scratch{"kvts-bench"};
     std::unique_ptr<TagService::TagStore> store;
     TagService::TagServiceLogic logic;
     std::unique_ptr<Bus::AmqpConnectionManager> serviceManager;
@@ -167,15 +150,8 @@ BENCHMARK(BM_Query)
 }  // namespace
 
 int main(int argc, char** argv) {
-    std::string envFile;
-    g_broker = Bench::LoadBroker(envFile);
-    if (!g_broker) {
-        std::printf(
-            "tagservice_bench: skipped, no test broker described in %s (start one with "
-            "tests/integration/broker/broker.sh start FILE and set KVVELDRA_BROKER_ENV=FILE)\n",
-            envFile.c_str());
-        return 0;
-    }
+    g_broker = Bench::BrokerOrSkip("tagservice_bench");
+    if (!g_broker) return 0;
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
     benchmark::RunSpecifiedBenchmarks();

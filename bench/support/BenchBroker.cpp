@@ -2,6 +2,7 @@
 
 #include <unistd.h>
 
+#include <cstdio>
 #include <cstdlib>
 #include <fstream>
 #include <map>
@@ -39,6 +40,18 @@ std::optional<BrokerAddress> LoadBroker(std::string& path) {
     BrokerAddress broker{values["BROKER_HOST"], values["BROKER_USER"], values["BROKER_PASSWORD"],
                          std::atoi(values["BROKER_AMQP_PORT"].c_str())};
     if (broker.host.empty() || broker.port == 0) return std::nullopt;
+    return broker;
+}
+
+std::optional<BrokerAddress> BrokerOrSkip(const std::string& benchmark) {
+    std::string envFile;
+    auto broker = LoadBroker(envFile);
+    if (!broker) {
+        std::printf(
+            "%s: skipped, no test broker described in %s (start one with "
+            "tests/integration/broker/broker.sh start FILE and set KVVELDRA_BROKER_ENV=FILE)\n",
+            benchmark.c_str(), envFile.c_str());
+    }
     return broker;
 }
 

@@ -20,6 +20,10 @@ struct BrokerAddress {
 // result is empty when it describes no broker.
 std::optional<BrokerAddress> LoadBroker(std::string& path);
 
+// The broker as LoadBroker finds it, or empty after a line on standard
+// output saying that the benchmark of that name is skipped, and why.
+std::optional<BrokerAddress> BrokerOrSkip(const std::string& benchmark);
+
 // A manager of its own on the broker and exchange.
 std::unique_ptr<MessageBus::AmqpConnectionManager> MakeManager(const BrokerAddress& broker,
                                                                const std::string& exchange);

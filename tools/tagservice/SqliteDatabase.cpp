@@ -53,7 +53,7 @@ SqliteDatabase::SqliteDatabase(const std::string& file) : db_(nullptr, sqlite3_c
                                            SQLITE_OPEN_NOMUTEX, nullptr);
     db_.reset(raw);
     if (result != SQLITE_OK) Fail(raw, "cannot open " + file);
-    sqlite3_busy_timeout(raw, 5000);
+    sqlite3_busy_timeout(raw, 1000);
 }
 
 void SqliteDatabase::Execute(const char* sql) {

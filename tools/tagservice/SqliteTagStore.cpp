@@ -7,9 +7,15 @@ namespace Korvane::Veldra::TagService {
 namespace {
 
 SqliteDatabase& Prepared(SqliteDatabase& db) {
+    // One service a file: the first write lock is kept until the file is
+    // closed, and taken here, so that a second service on the file fails at
+    // its start instead of serving tags that the first one changes.
+    db.Execute("PRAGMA locking_mode=EXCLUSIVE");
     db.Execute("PRAGMA journal_mode=WAL");
     db.Execute("PRAGMA synchronous=FULL");
+    db.Execute("BEGIN EXCLUSIVE");
     db.Execute("CREATE TABLE IF NOT EXISTS tags (path TEXT PRIMARY KEY NOT NULL, body TEXT NOT NULL)");
+    db.Execute("COMMIT");
     return db;
 }
 

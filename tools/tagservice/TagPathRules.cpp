@@ -14,6 +14,9 @@ bool IsBlankOrDot(char c) {
 
 std::optional<std::string> NewTagPathError(const std::string& path) {
     if (path.empty()) return std::string("Tag.TagPathCannotBeEmpty");
+    // A text of a body ends at a zero byte, so such a path could not be
+    // given back as it was stored.
+    if (path.find('\0') != std::string::npos) return std::string("Tag.InvalidTagPath");
     if (path.find('*') != std::string::npos) return std::string("Tag.TagPathCannotContainAWildcard");
     if (std::all_of(path.begin(), path.end(), IsBlankOrDot)) {
         return std::string("Tag.TagPathCannotContainOnlyWhiteSpaceAndDots");

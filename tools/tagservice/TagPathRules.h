@@ -8,7 +8,8 @@
 namespace Korvane::Veldra::TagService {
 
 // The error name that refuses a path for a new tag, or nothing when the path
-// may be created: empty, holding a '*', or made of blanks and dots only.
+// may be created: empty, holding a '*', made of blanks and dots only, or
+// holding a zero byte ("Tag.InvalidTagPath").
 std::optional<std::string> NewTagPathError(const std::string& path);
 
 // True when a search pattern matches a whole path. '*' matches any run of

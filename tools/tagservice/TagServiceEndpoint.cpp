@@ -5,6 +5,7 @@
 
 #include "ServiceLog.h"
 #include "messagebus/service/MessageServiceSettings.h"
+#include "messagelibrary/GenericResponse.h"
 #include "messagelibrary/TagServices.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
 #include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsResponse.h"
@@ -44,6 +45,8 @@ TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manage
                                        TagServiceLogic& logic, bool verbose)
     : logic_(logic), verbose_(verbose), service_(SettingsOn(manager)) {
     service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
+    service_.SetDefaultResponseCallback(std::make_shared<Handler>(
+        [this](const Received& received) { Unhandled(received); }));
     RegisterHandlers();
     for (const std::string& target : {VeldraMessageLibrary::kTagInfoService,
                                       VeldraMessageLibrary::kTagCurrentValueService,
@@ -120,6 +123,7 @@ void TagServiceEndpoint::OnRouted(std::function<Outcome(const Message&)> handle)
         Broadcasts broadcasts;
         if (const auto message = Parse<Message>(received, error)) {
             try {
+                std::lock_guard<std::mutex> lock(logicMutex_);
                 Outcome outcome = handle(*message);
                 error = std::move(outcome.error);
                 broadcasts = std::move(outcome.broadcasts);
@@ -143,16 +147,40 @@ void TagServiceEndpoint::OnRequest(
         std::unique_ptr<Response> response;
         if (const auto message = Parse<Message>(received, error)) {
             try {
+                std::lock_guard<std::mutex> lock(logicMutex_);
                 response = answer(received, *message, broadcasts);
             } catch (const std::exception& failure) {
                 error = Failure(received, failure, false);
             }
         }
-        if (!response) response = std::make_unique<Response>(received, *error);
+        if (!response) {
+            response = std::make_unique<Response>(
+                received, error.value_or(ServiceError("Veldra.InternalServiceError")));
+        }
         Publish(*response);
         SendBroadcasts(broadcasts);
         Report(received, error);
     });
+}
+
+void TagServiceEndpoint::Unhandled(const Received& received) {
+    const std::string& type = received.MessageType();
+    const auto endsWith = [&](const std::string& suffix) {
+        return type.size() >= suffix.size() &&
+               type.compare(type.size() - suffix.size(), suffix.size(), suffix) == 0;
+    };
+    WriteLogLine(std::cerr, "no handler for " + type + " from " + received.Origin());
+    // Requests and routed messages get an answer, so that their senders need
+    // not wait for a time-out; anything else could answer an answer.
+    if (!endsWith("Request") && !endsWith("RoutedMessage")) return;
+    const std::optional<MessageError> error = ServiceError("Veldra.NotSupported");
+    if (endsWith("Request")) {
+        MessageBus::GenericResponse response(received, error);
+        Publish(response);
+    } else {
+        Answer(received, error);
+    }
+    Report(received, error);
 }
 
 void TagServiceEndpoint::Publish(MessageBus::MessageBase& message) {

@@ -16,7 +16,7 @@ namespace Korvane::Veldra::TagService {
 // TagCurrentValue and TagIngestion, one handler a message name. Each
 // message is parsed, handed to the rules, answered, and its broadcasts sent;
 // a body that does not parse is answered with "Veldra.FailedToParse" and
-// logged. Messages are handled one at a time, on the bus's handling thread.
+// logged, a message of an unknown name with "Veldra.NotSupported". Messages are handled one at a time, on the bus's handling thread.
 class TagServiceEndpoint {
 public:
     // Connects, declares and binds the queue and starts consuming; throws
@@ -49,6 +49,9 @@ private:
     std::optional<Message> Parse(const Received& received,
                                  std::optional<MessageBus::MessageError>& error);
 
+    // A message of a name without a handler: logged, and a request or a
+    // routed message answered with "Veldra.NotSupported".
+    void Unhandled(const Received& received);
     void Publish(MessageBus::MessageBase& message);
     void Answer(const Received& received, const std::optional<MessageBus::MessageError>& error);
     void SendBroadcasts(const Broadcasts& broadcasts);
@@ -57,6 +60,7 @@ private:
                                      bool parsing);
 
     TagServiceLogic& logic_;
+    std::mutex logicMutex_;  // the rules and their store are not thread-safe
     const bool verbose_;
     MessageBus::MessageService service_;
 };

@@ -11,6 +11,7 @@
 #include "ServiceLog.h"
 #include "ServiceOptions.h"
 #include "SqliteTagStore.h"
+#include "StatusLinePump.h"
 #include "TagServiceEndpoint.h"
 #include "errors/VeldraException.h"
 #include "messagebus/config/BusConfigurations.h"
@@ -68,10 +69,12 @@ int Run(const TagService::ServiceOptions& options) {
     TagService::TagServiceLogic logic(*store);
 
     std::unique_ptr<MessageBus::AmqpConnectionManager> manager;
+    std::unique_ptr<TagService::StatusLinePump> statusLines;
     std::unique_ptr<TagService::TagServiceEndpoint> endpoint;
     std::string broker;
     try {
         manager = ManagerFor(options, broker);
+        statusLines = std::make_unique<TagService::StatusLinePump>(*manager);
         endpoint = std::make_unique<TagService::TagServiceEndpoint>(*manager, logic,
                                                                     options.verbose);
     } catch (const MessageBus::VeldraException* error) {
@@ -94,6 +97,7 @@ int Run(const TagService::ServiceOptions& options) {
     }
     WriteLogLine(std::cerr, std::string("stopping on ") + (signal == SIGINT ? "SIGINT" : "SIGTERM"));
     endpoint.reset();
+    statusLines.reset();
     manager.reset();
     store.reset();
     WriteLogLine(std::cerr, "stopped");

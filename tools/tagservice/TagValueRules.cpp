@@ -31,7 +31,7 @@ bool ReadsAsBool(const std::string& text) {
     return false;
 }
 
-// The value of a numeric text as a double, with its canonical text.
+// The value of a numeric text as a double.
 double NumericValue(TagDataType type, const std::string& text) {
     switch (type) {
         case TagDataType::Double: return TagLibrary::ParseDouble(text);
@@ -40,15 +40,21 @@ double NumericValue(TagDataType type, const std::string& text) {
     }
 }
 
+// The text of the value as the service writes it: 17 digits for a double,
+// plain decimal digits without leading zeros for the integers.
 std::string CanonicalText(TagDataType type, const std::string& text) {
     switch (type) {
         case TagDataType::Double: return TagLibrary::FormatDouble(TagLibrary::ParseDouble(text));
         case TagDataType::Int: return std::to_string(TagLibrary::ParseInt(text));
-        default: return text;
+        default: {
+            const auto first = text.find_first_not_of('0');
+            return first == std::string::npos ? "0" : text.substr(first);
+        }
     }
 }
 
-// -1, 0 or 1 as a compares with b; texts of UInt64 compare exactly as numbers.
+// -1, 0 or 1 as a compares with b, both canonical texts; those of UInt64
+// compare exactly, as digit strings.
 int Compare(TagDataType type, const std::string& a, const std::string& b) {
     if (type == TagDataType::UInt64) {
         if (a.size() != b.size()) return a.size() < b.size() ? -1 : 1;
@@ -62,6 +68,7 @@ int Compare(TagDataType type, const std::string& a, const std::string& b) {
 }  // namespace
 
 bool CanReadValue(TagDataType type, const std::string& text) {
+    if (text.find('\0') != std::string::npos) return false;
     try {
         switch (type) {
             case TagDataType::Double: TagLibrary::ParseDouble(text); return true;
@@ -70,8 +77,7 @@ bool CanReadValue(TagDataType type, const std::string& text) {
             case TagDataType::UInt64: return ReadsAsUInt64(text);
             case TagDataType::DateTime: {
                 VeldraMessageLibrary::Timestamp parsed;
-                return text.find('\0') == std::string::npos &&
-                       VeldraMessageLibrary::ParseTimestampZ(text.c_str(), parsed);
+                return VeldraMessageLibrary::ParseTimestampZ(text.c_str(), parsed);
             }
             case TagDataType::String: return true;
             default: return false;
@@ -90,14 +96,12 @@ void AddToAggregates(TagAggregates& aggregates, TagDataType type, const std::str
     if (!IsNumericType(type)) return;
     const double value = NumericValue(type, text);
     if (!std::isfinite(value)) return;
-    // UInt64 keeps its digits as given, without leading zeros beyond one.
-    std::string canonical = CanonicalText(type, text);
-    if (type == TagDataType::UInt64) {
-        const auto first = canonical.find_first_not_of('0');
-        canonical = first == std::string::npos ? "0" : canonical.substr(first);
-    }
+    const std::string canonical = CanonicalText(type, text);
+    if (aggregates.count == std::numeric_limits<int32_t>::max()) return;  // saturated
     aggregates.count += 1;
-    aggregates.avg += (value - aggregates.avg) / aggregates.count;
+    // Weighted, so that no intermediate sum leaves the range of a double.
+    const double weight = 1.0 / aggregates.count;
+    aggregates.avg = aggregates.avg * (1.0 - weight) + value * weight;
     if (!aggregates.min || Compare(type, canonical, *aggregates.min) < 0) aggregates.min = canonical;
     if (!aggregates.max || Compare(type, canonical, *aggregates.max) > 0) aggregates.max = canonical;
 }

@@ -2,6 +2,7 @@
 
 #include <fcntl.h>
 #include <signal.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -14,6 +15,7 @@
 
 #include "messagebus/config/VeldraConfiguration.h"
 #include "support/BrokerEnvironment.h"
+#include "support/ScratchDirectory.h"
 
 extern char** environ;
 
@@ -23,16 +25,6 @@ namespace {
 constexpr auto kReadyTimeout = std::chrono::seconds(30);
 constexpr auto kStopTimeout = std::chrono::seconds(30);
 constexpr const char* kReadyLine = "kvveldra-tagservice ready";
-
-std::string MakeTempDirectory(const std::string& stem) {
-    const char* tmp = std::getenv("TMPDIR");
-    std::string pattern = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/" + stem +
-                          ".XXXXXX";
-    if (mkdtemp(pattern.data()) == nullptr) {
-        throw std::runtime_error("mkdtemp " + pattern + ": " + std::strerror(errno));
-    }
-    return pattern;
-}
 
 // The environment of the child: ours with VELDRA_DATA_DIR replaced.
 std::vector<std::string> ChildEnvironment(const std::string& dataRoot) {
@@ -75,12 +67,16 @@ std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string&
 }
 
 const std::string& UseBrokerDataRoot() {
-    static const std::string root = [] {
-        std::string directory = WriteBrokerDataRoot(Broker(), MakeTempDirectory("kvveldra-data"));
-        setenv("VELDRA_DATA_DIR", directory.c_str(), 1);
-        return directory;
-    }();
-    return root;
+    // Made on first use, removed when the process ends.
+    struct DataRoot {
+        DataRoot() {
+            WriteBrokerDataRoot(Broker(), directory.Path());
+            setenv("VELDRA_DATA_DIR", directory.Path().c_str(), 1);
+        }
+        ScratchDirectory directory{"kvveldra-data"};
+    };
+    static const DataRoot root;
+    return root.directory.Path();
 }
 
 TagServiceProcess::TagServiceProcess(Options options) {
@@ -107,6 +103,10 @@ TagServiceProcess::TagServiceProcess(Options options) {
         dup2(devNull, STDIN_FILENO);
         dup2(pipeFds[1], STDOUT_FILENO);
         dup2(pipeFds[1], STDERR_FILENO);
+        // Nothing else of this process, its broker connections least of all.
+        if (syscall(SYS_close_range, 3U, ~0U, 0U) != 0) {
+            for (int fd = 3; fd < 65536; ++fd) close(fd);
+        }
         execve(argv[0], argv.data(), envp.data());
         _exit(127);
     }
@@ -118,6 +118,7 @@ TagServiceProcess::TagServiceProcess(Options options) {
     reader_ = std::thread([this, fd = pipeFds[0]] { ReadOutput(fd); });
     if (!WaitForOutput(kReadyLine, kReadyTimeout)) {
         Kill();
+        reader_.join();  // the output ends with the child
         throw std::runtime_error("kvveldra-tagservice did not print its ready line; its output:\n" +
                                  Output());
     }

@@ -5,7 +5,6 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
-#include <atomic>
 #include <filesystem>
 #include <mutex>
 #include <set>
@@ -13,25 +12,16 @@
 
 #include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsRequest.h"
 #include "messagelibrary/taginfo/TagInfoDeleteTagsRoutedMessage.h"
+#include "messagelibrary/taginfo/TagInfoQueryTagsRequest.h"
 #include "support/BrokerEnvironment.h"
 #include "support/CommandRunner.h"
+#include "support/ScratchDirectory.h"
 #include "tagservice/TagServiceClient.h"
 
 namespace Korvane::Veldra::Testing {
 namespace {
 
 using Tags::TagDataType;
-
-// A fresh directory under $TMPDIR, removed at the end.
-struct ScratchDirectory {
-    ScratchDirectory() {
-        const char* tmp = std::getenv("TMPDIR");
-        path = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/kvveldra-ts.XXXXXX";
-        if (mkdtemp(path.data()) == nullptr) throw std::runtime_error("mkdtemp failed");
-    }
-    ~ScratchDirectory() { std::filesystem::remove_all(path); }
-    std::string path;
-};
 
 // Counts the replies to writes that came back without an error, by state.
 class AckCounter : public MessageBus::Interfaces::IResponseCallback {
@@ -45,6 +35,18 @@ public:
         std::unique_lock<std::mutex> lock(mutex_);
         return changed_.wait_for(lock, timeout, [&] { return acked_.size() >= count; });
     }
+    // For the sender: true once count writes are acknowledged, false once
+    // Stop was called.
+    bool AwaitAcksUnlessStopped(std::size_t count) {
+        std::unique_lock<std::mutex> lock(mutex_);
+        changed_.wait(lock, [&] { return acked_.size() >= count || stopped_; });
+        return !stopped_;
+    }
+    void Stop() {
+        std::lock_guard<std::mutex> lock(mutex_);
+        stopped_ = true;
+        changed_.notify_all();
+    }
     std::set<uint32_t> Acked() {
         std::lock_guard<std::mutex> lock(mutex_);
         return acked_;
@@ -54,12 +56,13 @@ private:
     std::mutex mutex_;
     std::condition_variable changed_;
     std::set<uint32_t> acked_;
+    bool stopped_ = false;
 };
 
 TEST(TagServiceProcessTest, ARestartOnTheSameStoreServesTheSameTags) {
     ScratchDirectory scratch;
     TagServiceProcess::Options options;
-    options.store = scratch.path + "/tags.db";
+    options.store = scratch.Path() + "/tags.db";
     TagServiceClient client;
     const auto at = Tags::Timestamp(boost::gregorian::date(2020, 1, 2),
                                     boost::posix_time::seconds(3));
@@ -111,16 +114,18 @@ TEST(TagServiceProcessTest, ARestartOnTheSameStoreServesTheSameTags) {
 TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     ScratchDirectory scratch;
     TagServiceProcess::Options options;
-    options.store = scratch.path + "/tags.db";
+    options.store = scratch.Path() + "/tags.db";
     TagServiceClient client;
     auto service = std::make_unique<TagServiceProcess>(options);
     client.Create("kill.seq", TagDataType::Int, true);
 
+    // A stream of writes with up to kWindow of them unacknowledged at a time.
+    constexpr uint32_t kWindow = 50;
     AckCounter acks;
     client.Service().SetStateResponseCallback(&acks);
-    std::atomic<bool> sending{true};
     std::thread sender([&] {
-        for (uint32_t i = 1; sending && i < 1000000; ++i) {
+        for (uint32_t i = 1; i < 1000000; ++i) {
+            if (i > kWindow && !acks.AwaitAcksUnlessStopped(i - kWindow)) return;
             Tags::TagIngestionMessages::TagUpdateValuesRoutedMessage write(
                 std::vector<Tags::TagPathUpdates>{
                     {std::string("kill.seq"),
@@ -135,7 +140,7 @@ TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     });
     const bool enough = acks.WaitForAcks(300, std::chrono::seconds(60));
     service->Kill();
-    sending = false;
+    acks.Stop();
     sender.join();
     ASSERT_TRUE(enough) << service->Output();
     const std::set<uint32_t> acked = acks.Acked();
@@ -150,6 +155,30 @@ TEST(TagServiceProcessTest, AKillInTheMiddleOfWritesLosesNoAcknowledgedOne) {
     // is at least the newest acknowledged one.
     EXPECT_GE(static_cast<std::size_t>(values[0].aggregates->count), acked.size());
     EXPECT_GE(std::stoul(*values[0].current->value->value), *acked.rbegin());
+}
+
+TEST(TagServiceProcessTest, ItServesAgainAfterTheBrokerDropsItsConnections) {
+    TagServiceProcess service;
+    TagServiceClient client;
+    client.Create("reconnect.a", TagDataType::Int);
+    ASSERT_TRUE(CloseAllConnections());
+    // Both sides reconnect by themselves: ask, each time with a bounded wait,
+    // until an answer comes.
+    MessagePtr reply;
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(90);
+    while (reply == nullptr && std::chrono::steady_clock::now() < deadline) {
+        Tags::TagInfoMessages::TagInfoQueryTagsRequest query(
+            Tags::JsonStringList{"reconnect.a"}, std::nullopt, std::nullopt, 0, 0, true);
+        try {
+            reply = client.Service().SendRequest(query, 2000);
+        } catch (const std::exception&) {
+            // The client's publisher is still reconnecting.
+        }
+    }
+    ASSERT_NE(reply, nullptr) << service.Output();
+    Tags::TagInfoMessages::TagInfoQueryTagsResponse page(reply->Headers(), reply->Body());
+    EXPECT_EQ(page.TotalCount(), 1);
+    EXPECT_NE(service.Output().find("bus: "), std::string::npos) << service.Output();
 }
 
 TEST(TagServiceProcessTest, SigtermStopsItCleanly) {
@@ -175,10 +204,10 @@ TEST(TagServiceProcessTest, ABrokerItCannotReachEndsItWithStatusTwo) {
     ScratchDirectory scratch;
     BrokerSettings nowhere = Broker();
     nowhere.AmqpPort = ClosedPort();
-    WriteBrokerDataRoot(nowhere, scratch.path);
+    WriteBrokerDataRoot(nowhere, scratch.Path());
     const auto started = std::chrono::steady_clock::now();
     const CommandResult result =
-        RunCommand({"env", "VELDRA_DATA_DIR=" + scratch.path, KVVELDRA_TAGSERVICE_PATH,
+        RunCommand({"env", "VELDRA_DATA_DIR=" + scratch.Path(), KVVELDRA_TAGSERVICE_PATH,
                     "--connect-timeout", "2000"},
                    60);
     EXPECT_EQ(result.ExitCode, 2) << result.Output;
@@ -190,7 +219,7 @@ TEST(TagServiceProcessTest, AStoreThatCannotBeOpenedEndsItWithStatusThree) {
     ScratchDirectory scratch;
     const CommandResult result = RunCommand(
         {"env", "VELDRA_DATA_DIR=" + UseBrokerDataRoot(), KVVELDRA_TAGSERVICE_PATH, "--store",
-         scratch.path + "/no/such/dir/tags.db"},
+         scratch.Path() + "/no/such/dir/tags.db"},
         60);
     EXPECT_EQ(result.ExitCode, 3) << result.Output;
 }

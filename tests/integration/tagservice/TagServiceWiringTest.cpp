@@ -235,6 +235,17 @@ TEST_F(TagServiceWiringTest, BodiesThatDoNotParseAreAnsweredWithFailedToParse) {
                                        std::chrono::seconds(5)));
 }
 
+TEST_F(TagServiceWiringTest, AMessageOfAnUnknownNameIsAnsweredWithNotSupported) {
+    const MessagePtr request = client.Service().SendRequest(
+        Raw("TagInfo", "TagInfoRenameTagRequest", "{}"), kReplyTimeoutMs);
+    ASSERT_NE(request, nullptr);
+    EXPECT_EQ(ErrorName(*request), "Veldra.NotSupported");
+    auto routed = Raw("TagIngestion", "TagPurgeRoutedMessage", "{}");
+    const MessagePtr reply = client.Service().SendRequestExpectingResponse(routed, kReplyTimeoutMs);
+    ASSERT_NE(reply, nullptr);
+    EXPECT_EQ(ErrorName(*reply), "Veldra.NotSupported");
+}
+
 TEST_F(TagServiceWiringTest, VerbosePrintsOneLinePerMessage) {
     client.Query(Tags::JsonStringList{"wiring.verbose"});
     EXPECT_TRUE(service->WaitForOutput("TagInfoQueryTagsRequest from " + client.Service().Name() +

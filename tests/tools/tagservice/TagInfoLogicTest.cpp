@@ -129,10 +129,12 @@ TEST_F(TagInfoLogicTest, UpdateTagChangesWhatItCarries) {
     EXPECT_EQ(ErrorOf(logic.UpdateTag(TagInfo::TagInfoUpdateTagRoutedMessage(
                   std::string("none"), std::nullopt, std::nullopt, std::nullopt, false))),
               "Tag.NoSuchTag");
-    EXPECT_FALSE(logic.UpdateTag(TagInfo::TagInfoUpdateTagRoutedMessage(
-                     std::string("t"), JsonStringList{"b"}, std::nullopt,
-                     Tags::CollectAggregatesChange::None, false))
-                     .error);
+    const Outcome merged = logic.UpdateTag(TagInfo::TagInfoUpdateTagRoutedMessage(
+        std::string("t"), JsonStringList{"b"}, std::nullopt, Tags::CollectAggregatesChange::None,
+        false));
+    EXPECT_FALSE(merged.error);
+    ASSERT_EQ(merged.broadcasts.size(), 1u);
+    EXPECT_EQ(merged.broadcasts[0]->MessageType(), "TagInfoTagMetadataUpdatedBroadcast");
     EXPECT_EQ(store.Find("t")->record.keywords, (JsonStringList{"a", "b"}));
     EXPECT_TRUE(store.Find("t")->record.collectAggregates);
     logic.UpdateTag(TagInfo::TagInfoUpdateTagRoutedMessage(

@@ -11,29 +11,32 @@ TEST(TagPathRulesTest, NewPathsAreRefusedByTheFirstRuleTheyBreak) {
     EXPECT_EQ(NewTagPathError("*"), "Tag.TagPathCannotContainAWildcard");
     EXPECT_EQ(NewTagPathError(" . .\t"), "Tag.TagPathCannotContainOnlyWhiteSpaceAndDots");
     EXPECT_EQ(NewTagPathError("..."), "Tag.TagPathCannotContainOnlyWhiteSpaceAndDots");
+    EXPECT_EQ(NewTagPathError(std::string("a\0b", 3)), "Tag.InvalidTagPath");
     EXPECT_EQ(NewTagPathError(" a. "), std::nullopt);
     EXPECT_EQ(NewTagPathError("Zone/\xc3\xa9t\xc3\xa9.1"), std::nullopt);
 }
 
-TEST(TagPathRulesTest, AStarMatchesAnyRunDotsIncluded) {
-    EXPECT_TRUE(MatchesSearchPath("a.*", "a.b.c"));
-    EXPECT_TRUE(MatchesSearchPath("a.*", "a."));
-    EXPECT_FALSE(MatchesSearchPath("a.*", "a"));
-    EXPECT_TRUE(MatchesSearchPath("*.c", "a.b.c"));
-    EXPECT_TRUE(MatchesSearchPath("a*b*c", "a-x-b-y-b-c"));
-    EXPECT_FALSE(MatchesSearchPath("a*b*c", "a-x-b-y-c-d"));
-    EXPECT_TRUE(MatchesSearchPath("***", ""));
-    EXPECT_TRUE(MatchesSearchPath("***", "anything.at.all"));
-    EXPECT_TRUE(MatchesSearchPath("", ""));
-    EXPECT_FALSE(MatchesSearchPath("", "a"));
-}
+struct MatchCase {
+    const char* pattern;
+    const char* path;
+    bool matches;
+};
 
-TEST(TagPathRulesTest, OtherCharactersMatchThemselvesCaseIncluded) {
-    EXPECT_TRUE(MatchesSearchPath("a.b", "a.b"));
-    EXPECT_FALSE(MatchesSearchPath("a.b", "A.b"));
-    EXPECT_FALSE(MatchesSearchPath("a?b", "a.b"));
-    EXPECT_FALSE(MatchesSearchPath("a.b", "a.bc"));
-    EXPECT_FALSE(MatchesSearchPath("a.b", "xa.b"));
+// '*' matches any run, dots included; every other character matches itself,
+// case included.
+TEST(TagPathRulesTest, SearchPatternsMatchWholePaths) {
+    const MatchCase cases[] = {
+        {"a.*", "a.b.c", true},   {"a.*", "a.", true},      {"a.*", "a", false},
+        {"*.c", "a.b.c", true},   {"a*b*c", "a-x-b-y-b-c", true},
+        {"a*b*c", "a-x-b-y-c-d", false},                    {"***", "", true},
+        {"***", "any.path", true}, {"", "", true},          {"", "a", false},
+        {"a.b", "a.b", true},     {"a.b", "A.b", false},    {"a?b", "a.b", false},
+        {"a.b", "a.bc", false},   {"a.b", "xa.b", false},
+    };
+    for (const MatchCase& c : cases) {
+        EXPECT_EQ(MatchesSearchPath(c.pattern, c.path), c.matches)
+            << "'" << c.pattern << "' on '" << c.path << "'";
+    }
 }
 
 TEST(TagPathRulesTest, AnAbsentOrEmptyListMatchesEveryPath) {

@@ -1,12 +1,11 @@
 #include <gtest/gtest.h>
-#include <stdlib.h>
-
 #include <filesystem>
 #include <memory>
 
 #include "MemoryTagStore.h"
 #include "SqliteTagStore.h"
 #include "StoredTagJson.h"
+#include "support/ScratchDirectory.h"
 
 namespace Korvane::Veldra::TagService {
 namespace {
@@ -20,18 +19,13 @@ StoredTag Tag(const std::string& path, Tags::TagDataType type) {
     return tag;
 }
 
+// A store file in a scratch directory.
 class ScratchFile {
 public:
-    ScratchFile() {
-        const char* tmp = getenv("TMPDIR");
-        directory_ = std::string(tmp != nullptr && *tmp != '\0' ? tmp : "/tmp") + "/kvts.XXXXXX";
-        if (mkdtemp(directory_.data()) == nullptr) throw std::runtime_error("mkdtemp");
-    }
-    ~ScratchFile() { std::filesystem::remove_all(directory_); }
-    std::string Path() const { return directory_ + "/tags.db"; }
+    std::string Path() const { return directory_.Path() + "/tags.db"; }
 
 private:
-    std::string directory_;
+    Testing::ScratchDirectory directory_{"kvts"};
 };
 
 // Both stores keep the same contract.
@@ -94,6 +88,31 @@ TEST(SqliteTagStoreTest, AReopenedFileReadsBackWhatItWasGiven) {
     EXPECT_EQ(StoredTagToJson(*read), StoredTagToJson(tag));
     EXPECT_EQ(read->aggregates.avg, 1.0 / 3.0);
     EXPECT_EQ(read->current->timestamp, tag.current->timestamp);
+}
+
+// The times a message can carry; +infinity cannot, its text reads back as
+// the last microsecond of 9999.
+TEST(StoredTagJsonTest, ExtremeTimesReadBack) {
+    using boost::posix_time::ptime;
+    for (const Tags::Timestamp time :
+         {ptime(boost::posix_time::neg_infin),
+          ptime(boost::gregorian::date(9999, 12, 31), boost::posix_time::microseconds(86399999999)),
+          ptime(boost::gregorian::date(1400, 1, 1))}) {
+        StoredTag tag = Tag("t", Tags::TagDataType::DateTime);
+        tag.current = Tags::TagValueSample{time, Tags::TagValue{Tags::TagDataType::DateTime, "x"}};
+        const StoredTag read = StoredTagFromJson(StoredTagToJson(tag));
+        EXPECT_EQ(StoredTagToJson(read), StoredTagToJson(tag));
+    }
+}
+
+TEST(SqliteTagStoreTest, ASecondStoreOnAFileInUseIsRefused) {
+    ScratchFile file;
+    SqliteTagStore first(file.Path());
+    EXPECT_THROW(SqliteTagStore second(file.Path()), StoreError);
+    StoreBatch batch;
+    batch.put = {Tag("still", Tags::TagDataType::Int)};
+    first.Apply(batch);
+    EXPECT_NE(first.Find("still"), nullptr);
 }
 
 TEST(SqliteTagStoreTest, AFileThatIsNotAStoreIsRefusedWithItsReason) {
