@@ -19,7 +19,6 @@ TraceEntryBuffer BufferPool::Take() {
 }
 
 void BufferPool::Return(TraceEntryBuffer buffer) {
-    buffer.clear();
     // A vector whose storage was lost on the way gets it back here, on the
     // returning thread, so that Take never allocates for the caller.
     buffer.reserve(capacity_);

@@ -11,17 +11,20 @@ namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
 using TraceEntry = VeldraMessageLibrary::TraceLoggerMessages::TraceEntry;
 using TraceEntryBuffer = std::vector<TraceEntry>;
 
-// Free entry vectors kept for reuse: a vector that comes back keeps its
-// capacity, so a rotation of the current buffer does not allocate.
+// Entry vectors kept for reuse, entries included: a vector comes back with
+// its capacity and with the entries it shipped, which the next writer
+// overwrites, so that neither a rotation nor the strings of an entry
+// allocate once the pool is warm.
 class BufferPool {
 public:
     explicit BufferPool(std::size_t bufferCapacity) : capacity_(bufferCapacity) {}
     BufferPool(const BufferPool&) = delete;
     BufferPool& operator=(const BufferPool&) = delete;
 
-    // An empty vector with room for the capacity.
+    // A vector with room for the capacity; its entries are stale, to be
+    // written over.
     TraceEntryBuffer Take();
-    // Clears the vector and keeps it for the next Take.
+    // Keeps the vector, entries and all, for the next Take.
     void Return(TraceEntryBuffer buffer);
     std::size_t FreeCount() const;
 

@@ -59,14 +59,21 @@ void ProcessLogger::Take(const std::string& moduleName, const std::string* trace
     {
         std::lock_guard<std::mutex> lock(mutex_);
         if (shutdown_ || !failure_.empty()) return;
-        if (current_.size() >= kBufferEntries) {
+        if (currentUsed_ >= kBufferEntries) {
             Rotate(false);
             rotated = true;
         }
-        TraceEntry& entry = current_.emplace_back();
+        // Assigned into a stale entry, a string reuses the storage it has.
+        TraceEntry& entry =
+            currentUsed_ < current_.size() ? current_[currentUsed_] : current_.emplace_back();
+        ++currentUsed_;
         entry.moduleName = moduleName;
         entry.timestamp = now;
-        if (tracePointName != nullptr) entry.tracePointName = *tracePointName;
+        if (tracePointName != nullptr) {
+            entry.tracePointName = *tracePointName;
+        } else {
+            entry.tracePointName.reset();
+        }
         entry.text = text;
         entry.type = type;
     }
@@ -75,9 +82,11 @@ void ProcessLogger::Take(const std::string& moduleName, const std::string* trace
 }
 
 void ProcessLogger::Rotate(bool force) {
-    if (!force && current_.empty()) return;
+    if (!force && currentUsed_ == 0) return;
+    current_.resize(currentUsed_);  // drops the stale tail
     full_.push_back(std::move(current_));
     current_ = pool_->Take();
+    currentUsed_ = 0;
 }
 
 void ProcessLogger::RunLoggingThread() {

@@ -74,9 +74,12 @@ private:
     const std::shared_ptr<BufferPool> pool_;
     const std::shared_ptr<TracePointMap> tracePoints_;
 
-    // Guards current_, full_, shutdown_ and failure_.
+    // Guards current_, currentUsed_, full_, shutdown_ and failure_.
     mutable std::mutex mutex_;
+    // Entries from currentUsed_ on are stale ones of the pool, written over
+    // before they count.
     TraceEntryBuffer current_;
+    std::size_t currentUsed_ = 0;
     std::deque<TraceEntryBuffer> full_;
     bool shutdown_ = false;
     std::string failure_;

@@ -53,6 +53,25 @@ TEST_F(ProcessLoggerTest, ABurstOfOneMoreThanABufferLosesNothingAndKeepsOrder) {
     EXPECT_FALSE(entries[0].tracePointName.has_value());
 }
 
+TEST_F(ProcessLoggerTest, ReusedBuffersShipNothingStale) {
+    const std::string point = "Module.Point";
+    for (std::size_t i = 0; i < ProcessLogger::kBufferEntries; ++i) {
+        logger->Take("Module", &point, "first " + std::to_string(i), TraceEntryType::Log);
+    }
+    ASSERT_TRUE(bus->WaitForStoredEntries(ProcessLogger::kBufferEntries, kPatience));
+    // The rotation that ships this one takes the full buffer back from the
+    // pool, and the next entry is written over its first.
+    Write("between");
+    ASSERT_TRUE(bus->WaitForStoredEntries(ProcessLogger::kBufferEntries + 1, kPatience));
+    Write("second");
+    logger->Stop();
+    const auto entries = bus->StoredEntries();
+    ASSERT_EQ(entries.size(), ProcessLogger::kBufferEntries + 2);
+    EXPECT_EQ(entries.back().text, "second");
+    EXPECT_FALSE(entries.back().tracePointName.has_value());
+    EXPECT_EQ(entries.back().type, TraceEntryType::Info);
+}
+
 TEST_F(ProcessLoggerTest, ASingleEntryLeavesWithinATick) {
     const auto start = std::chrono::steady_clock::now();
     Write("alone");
