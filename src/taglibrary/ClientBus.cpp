@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <limits>
 
-#include "errors/AmqpException.h"
 #include "messagebus/amqp/AmqpConnectionManager.h"
 #include "messagebus/config/BusConfigurations.h"
 #include "messagebus/service/MessageService.h"
