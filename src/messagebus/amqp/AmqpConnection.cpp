@@ -27,6 +27,9 @@ using std::chrono::steady_clock;
 constexpr int kFrameMax = 131072;
 constexpr int32_t kLongestAttemptMs = 10000;
 constexpr auto kPauseAfterSocketError = std::chrono::seconds(5);
+// The least time the AMQP handshake gets once the socket is open, so that a
+// connect that used up its time-out on the socket still can log in.
+constexpr milliseconds kShortestHandshake(250);
 
 // A broker that goes silent without closing the socket would otherwise hold a
 // blocked send or receive of rabbitmq-c, and the gate, without end: the
@@ -65,6 +68,16 @@ void BoundSilentPeer(amqp_connection_state_t state) {
     setsockopt(fd, IPPROTO_TCP, TCP_KEEPINTVL, &kKeepAliveIntervalSeconds, sizeof(int));
     setsockopt(fd, IPPROTO_TCP, TCP_KEEPCNT, &kKeepAliveProbes, sizeof(int));
     setsockopt(fd, IPPROTO_TCP, TCP_USER_TIMEOUT, &kUserTimeoutMs, sizeof(unsigned));
+}
+
+// rabbitmq-c waits 12 s for a peer that accepted the socket but never speaks
+// AMQP; the login gets what is left of the connect time-out instead.
+void BoundHandshake(amqp_connection_state_t state, steady_clock::time_point deadline) {
+    const auto left = std::max(kShortestHandshake, std::chrono::duration_cast<milliseconds>(
+                                                        deadline - steady_clock::now()));
+    timeval timeout{static_cast<time_t>(left.count() / 1000),
+                    static_cast<suseconds_t>((left.count() % 1000) * 1000)};
+    amqp_set_handshake_timeout(state, &timeout);
 }
 
 struct ConnectionStateDeleter {
@@ -125,10 +138,12 @@ void AmqpConnection::Connect() {
         throw AmqpException(ErrorCodes::kOpeningTCPConnection, "No TCP connection.", 0);
     }
     amqp_socket_t* socket = NewSocket(state.get());
+    const auto deadline = steady_clock::now() + milliseconds(ConnectTimeoutMs);
     const int status = OpenSocket(socket);
     if (status != AMQP_STATUS_OK) ThrowOpenFailure(status);
 
     BoundSilentPeer(state.get());
+    if (ConnectTimeoutMs >= 0) BoundHandshake(state.get(), deadline);
     CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
                           User.c_str(), Password.c_str()),
                ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");

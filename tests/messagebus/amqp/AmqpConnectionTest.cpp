@@ -73,6 +73,34 @@ TEST(AmqpConnection, RefusedConnectionFailsWithinItsTimeout) {
     EXPECT_EQ(Testing::fakeSsl.uninits, 2);
 }
 
+// A peer that accepts the socket and never answers: the login ends with the
+// connect time-out, not with rabbitmq-c's own 12 s handshake wait.
+TEST(AmqpConnection, SilentPeerFailsTheLoginWithinTheConnectTimeout) {
+    Testing::fakeSsl = {};
+    const int listener = ::socket(AF_INET, SOCK_STREAM, 0);
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    socklen_t length = sizeof address;
+    ASSERT_EQ(::bind(listener, reinterpret_cast<sockaddr*>(&address), length), 0);
+    ASSERT_EQ(::getsockname(listener, reinterpret_cast<sockaddr*>(&address), &length), 0);
+    ASSERT_EQ(::listen(listener, 4), 0);
+
+    SslInitLibrary ssl("libfake.so", Testing::FakeSslLoader());
+    const auto start = std::chrono::steady_clock::now();
+    std::optional<AmqpException> failure;
+    try {
+        BareConnection connection(nullptr, ntohs(address.sin_port), false, "", 1000, ssl);
+    } catch (const AmqpException& error) {
+        failure = error;
+    }
+    const auto elapsed = std::chrono::steady_clock::now() - start;
+    ::close(listener);
+    ASSERT_TRUE(failure.has_value());
+    EXPECT_EQ(failure->Code(), ErrorCodes::kFailedToLogIn);
+    EXPECT_LT(elapsed, std::chrono::seconds(5));
+}
+
 TEST(AmqpConnection, MissingCaFileFailsBeforeAnyConnect) {
     const auto failure = ConnectFailure(nullptr, true, "/nonexistent/ca.pem", 100);
     ASSERT_TRUE(failure.has_value());
