@@ -19,7 +19,18 @@ ScratchDirectory& StoreDirectory() {
 
 }  // namespace
 
-void ConsoleBrokerTest::SetUpTestSuite() {
+bool ConsoleBrokerTest::attempted = false;
+bool ConsoleBrokerTest::ready = false;
+
+void ConsoleBrokerTest::SetUp() {
+    if (!attempted) {
+        attempted = true;
+        StartSuite();
+    }
+    ASSERT_TRUE(ready) << "the tag service or the console instance did not start (see above)";
+}
+
+void ConsoleBrokerTest::StartSuite() {
     // Before the first initialize: the library reads the data root once.
     UseBrokerDataRoot();
     StartService();
@@ -27,6 +38,7 @@ void ConsoleBrokerTest::SetUpTestSuite() {
     ASSERT_EQ(TagConsoleReserve(&reserved), 0);
     std::string error;
     ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0) << error;
+    ready = true;
 }
 
 void ConsoleBrokerTest::TearDownTestSuite() {

@@ -25,7 +25,10 @@ inline constexpr int32_t kStringTagCannotCollectAggregates = -251908;
 // can be stopped and started again. Each test works under paths of its own.
 class ConsoleBrokerTest : public ::testing::Test {
 protected:
-    static void SetUpTestSuite();
+    // The service and the instance are started by the first test, not in
+    // SetUpTestSuite: a failure there would show every test as skipped, and
+    // ctest would pass the run. Here each test fails while they are not up.
+    void SetUp() override;
     static void TearDownTestSuite();
 
     // Restarts the service on the same store.
@@ -46,6 +49,11 @@ protected:
     static void Close(uint32_t reference, int count = 1);
 
     static std::unique_ptr<TagServiceProcess> service;
+
+private:
+    static void StartSuite();
+    static bool attempted;
+    static bool ready;
 };
 
 }  // namespace Korvane::Veldra::Testing
