@@ -8,57 +8,42 @@ namespace {
 
 using RequestPtr = std::shared_ptr<ConsoleAsyncRequest>;
 
+// A get of one tag's metadata: start the lookup, wait, and let the finish
+// fill the caller's out-argument; a null out-argument gives 1.
+template <typename Out, typename Start, typename Finish>
+int32_t GetOnConsoleTag(uint32_t tagReference, bool verbose, Out* result, std::string* error,
+                        Start start, Finish finish) {
+    return RunOnConsoleTag(
+        tagReference, verbose, error,
+        [&](Client& client, const std::shared_ptr<TagData>& tag, std::string& text) {
+            if (result == nullptr) return 1;
+            return RunBlocking(
+                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
+                    return (client.*start)(tag, request, id, timeoutMs, out);
+                },
+                [&](uint32_t id, std::string& out) { return (client.*finish)(id, *result, out); },
+                text);
+        });
+}
+
 }  // namespace
 
 int32_t TagConsoleGetKeywords(uint32_t tagReference, bool verbose,
                               std::vector<std::string>* keywords, std::string* error) {
-    return RunOnConsoleTag(
-        tagReference, verbose, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, std::string& text) {
-            if (keywords == nullptr) return 1;
-            return RunBlocking(
-                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
-                    return client.GetKeywords(tag, request, id, timeoutMs, out);
-                },
-                [&](uint32_t id, std::string& out) {
-                    return client.FinishGetKeywords(id, *keywords, out);
-                },
-                text);
-        });
+    return GetOnConsoleTag(tagReference, verbose, keywords, error, &Client::GetKeywords,
+                           &Client::FinishGetKeywords);
 }
 
 int32_t TagConsoleGetProperties(uint32_t tagReference, bool verbose,
                                 TagConsoleProperties* properties, std::string* error) {
-    return RunOnConsoleTag(
-        tagReference, verbose, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, std::string& text) {
-            if (properties == nullptr) return 1;
-            return RunBlocking(
-                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
-                    return client.GetProperties(tag, request, id, timeoutMs, out);
-                },
-                [&](uint32_t id, std::string& out) {
-                    return client.FinishGetProperties(id, *properties, out);
-                },
-                text);
-        });
+    return GetOnConsoleTag(tagReference, verbose, properties, error, &Client::GetProperties,
+                           &Client::FinishGetProperties);
 }
 
 int32_t TagConsoleGetCollectAggregates(uint32_t tagReference, bool verbose,
                                        bool* collectAggregates, std::string* error) {
-    return RunOnConsoleTag(
-        tagReference, verbose, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, std::string& text) {
-            if (collectAggregates == nullptr) return 1;
-            return RunBlocking(
-                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
-                    return client.GetCollectAggregates(tag, request, id, timeoutMs, out);
-                },
-                [&](uint32_t id, std::string& out) {
-                    return client.FinishGetCollectAggregates(id, *collectAggregates, out);
-                },
-                text);
-        });
+    return GetOnConsoleTag(tagReference, verbose, collectAggregates, error,
+                           &Client::GetCollectAggregates, &Client::FinishGetCollectAggregates);
 }
 
 int32_t TagConsoleSetKeywords(uint32_t tagReference, const std::vector<std::string>* keywords,
