@@ -60,6 +60,8 @@ fi
 
 status=0
 "$build/tools/demo/kvveldra-demo" || status=$?
-echo "--- kvveldra-tagservice output"
-cat "$work/service.log"
+if [ "$status" -ne 0 ]; then
+    echo "--- kvveldra-tagservice output" >&2
+    cat "$work/service.log" >&2
+fi
 exit "$status"

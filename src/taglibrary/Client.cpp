@@ -18,9 +18,18 @@ void Client::Trace(const char* format, const std::string& path) const {
     if (Verbose()) std::printf(format, path.c_str());
 }
 
+void Client::TraceLine(const char* line) const {
+    if (Verbose()) std::puts(line);
+}
+
 std::shared_ptr<TagData> Client::MapTag(uint64_t instanceId, const std::string& path,
                                         std::optional<TagDataType> dataType) {
     std::lock_guard<std::mutex> lock(mutex_);
+    return MapTagLocked(instanceId, path, dataType);
+}
+
+std::shared_ptr<TagData> Client::MapTagLocked(uint64_t instanceId, const std::string& path,
+                                              std::optional<TagDataType> dataType) {
     const auto found = tags_->find(path);
     if (found != tags_->end()) {
         Trace("Tag data for %s is already mapped and will be updated.\n", path);
@@ -67,6 +76,19 @@ int32_t Client::GetPath(const std::shared_ptr<TagData>& tag, std::string& path,
     Trace("Getting Path for tag: %s\n", tag->path);
     path = tag->path;
     return 0;
+}
+
+int32_t Client::ExportedType(const TagData& tag) const {
+    std::lock_guard<std::mutex> lock(mutex_);
+    return TypeToExported(tag.dataType);
+}
+
+std::vector<std::string> Client::CopyPaths(const std::vector<std::shared_ptr<TagData>>& tags) const {
+    std::vector<std::string> paths;
+    paths.reserve(tags.size());
+    std::lock_guard<std::mutex> lock(mutex_);
+    for (const auto& tag : tags) paths.push_back(tag->path);
+    return paths;
 }
 
 std::size_t Client::OpenTagCount() const {

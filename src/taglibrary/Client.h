@@ -12,6 +12,7 @@
 #include "errors/Errors.h"
 #include "errors/VeldraException.h"
 #include "messagelibrary/MessageBase.h"
+#include "messagelibrary/TagRecords.h"
 #include "taglibrary/TagData.h"
 #include "taglibrary/requests/AsyncRequest.h"
 #include "taglibrary/requests/AsyncRequestMap.h"
@@ -91,6 +92,85 @@ public:
                             std::optional<TagDataType> dataType, uint32_t requestId,
                             std::shared_ptr<TagData>& tag, std::string& error);
 
+    // ---- Write ----
+    // One message with the tag's samples, in their order, to "TagIngestion".
+    int32_t WriteValues(const std::shared_ptr<TagData>& tag,
+                        const std::vector<VeldraMessageLibrary::TagValueSample>& samples,
+                        const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                        uint32_t& timeoutMs, std::string& error);
+    // One message for many paths: samples[i] belongs to paths[i]; a path
+    // named several times gets one entry with its samples in input order.
+    // `samples` must be at least as long as `paths`.
+    int32_t WriteMulti(const std::vector<std::string>& paths,
+                       const std::vector<VeldraMessageLibrary::TagValueSample>& samples,
+                       const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                       uint32_t& timeoutMs, std::string& error);
+
+    // ---- Read and list ----
+    int32_t ListTags(const std::vector<std::string>& searchPaths,
+                     const std::unordered_map<std::string, std::string>& properties,
+                     const std::vector<std::string>& keywords, uint32_t skip, uint32_t take,
+                     bool allowStale, const std::shared_ptr<AsyncRequest>& request,
+                     uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // Opens every tag of the page: each appended record owes one CloseTag.
+    // `totalCount` is the service's count of all matches.
+    int32_t FinishListTags(uint64_t instanceId, uint32_t requestId,
+                           std::vector<std::shared_ptr<TagData>>& tags, int32_t& totalCount,
+                           std::string& error);
+    // `tags` must not be empty.
+    int32_t ReadValues(const std::vector<std::shared_ptr<TagData>>& tags, bool allowStale,
+                       const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                       uint32_t& timeoutMs, std::string& error);
+    // The service's records as they came: its order, maybe fewer than asked.
+    int32_t FinishReadValues(uint32_t requestId,
+                             std::vector<VeldraMessageLibrary::TagCurrentValue>& values,
+                             std::string& error);
+
+    // ---- Metadata ----
+    // The gets and sets hold the mutex across their publish.
+    int32_t GetKeywords(const std::shared_ptr<TagData>& tag,
+                        const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                        uint32_t& timeoutMs, std::string& error);
+    int32_t GetProperties(const std::shared_ptr<TagData>& tag,
+                          const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                          uint32_t& timeoutMs, std::string& error);
+    int32_t GetCollectAggregates(const std::shared_ptr<TagData>& tag,
+                                 const std::shared_ptr<AsyncRequest>& request,
+                                 uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // The finishes of the gets: "Tag.NoSuchTag" unless exactly one record
+    // came. Keywords are appended and properties assigned into what the
+    // caller passes.
+    int32_t FinishGetKeywords(uint32_t requestId, std::vector<std::string>& keywords,
+                              std::string& error);
+    int32_t FinishGetProperties(uint32_t requestId,
+                                std::unordered_map<std::string, std::string>& properties,
+                                std::string& error);
+    int32_t FinishGetCollectAggregates(uint32_t requestId, bool& collectAggregates,
+                                       std::string& error);
+    // The sets: finished by FinishRequest, which also reports the failures
+    // that the reply carries in its body.
+    int32_t SetKeywords(const std::shared_ptr<TagData>& tag, const std::vector<std::string>& keywords,
+                        bool merge, const std::shared_ptr<AsyncRequest>& request,
+                        uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    int32_t SetProperties(const std::shared_ptr<TagData>& tag,
+                          const std::unordered_map<std::string, std::string>& properties,
+                          bool merge, const std::shared_ptr<AsyncRequest>& request,
+                          uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // The caller passes a live tag.
+    int32_t SetCollectAggregates(const std::shared_ptr<TagData>& tag, bool collectAggregates,
+                                 const std::shared_ptr<AsyncRequest>& request,
+                                 uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // `tags` must not be empty. Deleting leaves the local records open.
+    int32_t ResetAggregates(const std::vector<std::shared_ptr<TagData>>& tags,
+                            const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                            uint32_t& timeoutMs, std::string& error);
+    int32_t DeleteTags(const std::vector<std::shared_ptr<TagData>>& tags,
+                       const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                       uint32_t& timeoutMs, std::string& error);
+    // Deletes every tag of the service and waits for the answer on the
+    // calling thread; the one operation with no request.
+    int32_t DeleteAllTags(std::string& error);
+
     // Maps a path to its record: a new one with one session, or the existing
     // one with its type replaced and one more session.
     std::shared_ptr<TagData> MapTag(uint64_t instanceId, const std::string& path,
@@ -100,6 +180,9 @@ public:
     // The exported type number of the record, from local state only.
     int32_t GetDataType(const std::shared_ptr<TagData>& tag, int32_t& type, std::string& error);
     int32_t GetPath(const std::shared_ptr<TagData>& tag, std::string& path, std::string& error);
+    // The exported type number of a record that the caller knows to be live;
+    // no verbose line.
+    int32_t ExportedType(const TagData& tag) const;
 
     void SetVerbose(bool verbose) { verbose_.store(verbose, std::memory_order_relaxed); }
     bool Verbose() const { return verbose_.load(std::memory_order_relaxed); }
@@ -128,6 +211,26 @@ public:
 private:
     // Prints a verbose progress line that carries a tag path.
     void Trace(const char* format, const std::string& path) const;
+    // Prints a verbose progress line without arguments.
+    void TraceLine(const char* line) const;
+    // MapTag with the mutex already held.
+    std::shared_ptr<TagData> MapTagLocked(uint64_t instanceId, const std::string& path,
+                                          std::optional<TagDataType> dataType);
+    // The paths of the records, in order, copied under the mutex.
+    std::vector<std::string> CopyPaths(const std::vector<std::shared_ptr<TagData>>& tags) const;
+    // The shared start of the three gets: a lookup of the tag's one path.
+    int32_t SendTagLookup(const char* traceFormat, const std::shared_ptr<TagData>& tag,
+                          const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                          uint32_t& timeoutMs, std::string& error);
+    // The shared finish of the three gets: the one record, or "Tag.NoSuchTag".
+    int32_t FinishTagLookup(uint32_t requestId, VeldraMessageLibrary::TagRecord& record,
+                            std::string& error);
+    // The shared body of the three sets: one change of one record, merged or not.
+    int32_t SendTagChange(const char* traceFormat, const std::shared_ptr<TagData>& tag,
+                          VeldraMessageLibrary::TagRecord record,
+                          VeldraMessageLibrary::TagChangeFlags change, bool merge,
+                          const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
+                          uint32_t& timeoutMs, std::string& error);
     // What both send paths share: file the request, send, hand out the
     // time-out, and on failure take the request back out.
     template <typename Send>

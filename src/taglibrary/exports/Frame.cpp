@@ -47,6 +47,32 @@ void RegisterReferenceIfAbsent(const std::shared_ptr<TagData>& tag) {
     state.TagReferenceTable.emplace(tag->Reference(), tag);
 }
 
+void RegisterReferencesIfAbsent(const std::vector<std::shared_ptr<TagData>>& tags) {
+    auto& state = ProcessState::Get();
+    std::lock_guard<std::mutex> lock(state.TableMutex);
+    for (const auto& tag : tags) state.TagReferenceTable.emplace(tag->Reference(), tag);
+}
+
+std::vector<std::shared_ptr<TagData>> LookupInstanceTags(uint64_t instanceId,
+                                                         const std::vector<uint32_t>& references,
+                                                         bool& missing) {
+    std::vector<std::shared_ptr<TagData>> tags;
+    tags.reserve(references.size());
+    missing = false;
+    auto& state = ProcessState::Get();
+    std::lock_guard<std::mutex> lock(state.TableMutex);
+    for (const uint32_t reference : references) {
+        const auto found = state.TagReferenceTable.find(reference);
+        // A tag of another instance is as wrong here as an unknown number.
+        if (found == state.TagReferenceTable.end() || found->second->instanceId != instanceId) {
+            missing = true;
+            continue;
+        }
+        tags.push_back(found->second);
+    }
+    return tags;
+}
+
 void EraseReference(uint32_t tagReference) {
     std::shared_ptr<TagData> released;  // dies after the lock is let go
     auto& state = ProcessState::Get();

@@ -1,32 +1,8 @@
 // Console functions that answer from the local tag records, with no bus traffic.
 #include "kvveldra/TagConsole.h"
-#include "taglibrary/exports/ErrorOut.h"
-#include "taglibrary/exports/Frame.h"
+#include "taglibrary/exports/ConsoleCall.h"
 
 using namespace Korvane::Veldra::TagLibrary;
-
-namespace {
-
-// The frame of a console function on one tag reference: resolves the
-// reference, sets the Client's verbose flag, and runs `operation` with the
-// Client, the record and a text for its failure.
-template <typename Operation>
-int32_t RunOnConsoleTag(uint32_t tagReference, bool verbose, std::string* error,
-                        Operation&& operation) {
-    ConsoleErrorOut out(error);
-    return RunInFrame(out, [&] {
-        if (tagReference == 0) return ReportNamedError("Tag.InvalidTagReference", out);
-        std::shared_ptr<Client> client;
-        std::shared_ptr<TagData> tag;
-        if (const int32_t status = FindTag(tagReference, client, tag, out)) return status;
-        client->SetVerbose(verbose);
-        std::string text;
-        const int32_t status = operation(*client, tag, text);
-        return status == 0 ? status : out.Report(status, text);
-    });
-}
-
-}  // namespace
 
 int32_t TagConsoleClose(uint32_t tagReference, bool verbose, std::string* error) {
     return RunOnConsoleTag(

@@ -7,13 +7,13 @@
 #include <unistd.h>
 
 #include <cerrno>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <stdexcept>
 
-#include "messagebus/config/VeldraConfiguration.h"
 #include "support/BrokerEnvironment.h"
 #include "support/ScratchDirectory.h"
 
@@ -43,25 +43,42 @@ std::vector<char*> Pointers(std::vector<std::string>& texts) {
     return result;
 }
 
+// A JSON string of plain text: quotes, backslashes and control bytes escaped.
+std::string JsonText(const std::string& text) {
+    std::string out = "\"";
+    for (const char c : text) {
+        if (c == '"' || c == '\\') {
+            out += '\\';
+            out += c;
+        } else if (static_cast<unsigned char>(c) < 0x20) {
+            char escaped[8];
+            std::snprintf(escaped, sizeof escaped, "\\u%04x", c);
+            out += escaped;
+        } else {
+            out += c;
+        }
+    }
+    return out + "\"";
+}
+
 }  // namespace
 
 std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string& directory,
                                 const std::string& id) {
-    MessageBus::VeldraConfiguration configuration;
-    configuration.Id = id;
-    configuration.DisplayName = "private test broker";
-    configuration.ConnectionType = MessageBus::ConnectionType::Local;
-    configuration.ExchangeName = "kvveldra.amqpio.test";
-    configuration.Host = broker.Host;
-    configuration.VirtualHost = broker.VirtualHost;
-    configuration.Port = broker.AmqpPort;
-    configuration.User = broker.User;
-    configuration.Password = broker.Password;
-    configuration.UseTls = false;
+    // Written by hand, as a deployment writes it, so that this support needs
+    // nothing of the library and also serves tests of the shared library alone.
+    const std::string text = "{\"Id\":" + JsonText(id) +
+                             ",\"DisplayName\":\"private test broker\",\"ConnectionType\":\"Local\"" +
+                             ",\"ExchangeName\":\"kvveldra.amqpio.test\",\"Host\":" +
+                             JsonText(broker.Host) + ",\"VirtualHost\":" +
+                             JsonText(broker.VirtualHost) +
+                             ",\"Port\":" + std::to_string(broker.AmqpPort) +
+                             ",\"User\":" + JsonText(broker.User) +
+                             ",\"Password\":" + JsonText(broker.Password) + ",\"UseTls\":false}";
     const std::filesystem::path folder = std::filesystem::path(directory) / "VeldraConfigurations";
     std::filesystem::create_directories(folder);
     std::ofstream file(folder / (id + ".json"), std::ios::trunc);
-    file << configuration.ToJson();
+    file << text;
     if (!file.flush()) throw std::runtime_error("cannot write " + (folder / id).string() + ".json");
     return directory;
 }
