@@ -26,6 +26,22 @@ int32_t GetOnConsoleTag(uint32_t tagReference, bool verbose, Out* result, std::s
         });
 }
 
+// An operation on a batch of references whose finish delivers nothing.
+template <typename Start>
+int32_t OnConsoleReferences(uint64_t instanceId, const std::vector<uint32_t>* tagReferences,
+                            bool verbose, std::string* error, Start start) {
+    return RunOnConsoleReferences(
+        instanceId, tagReferences, verbose, error,
+        [&](Client& client, const std::vector<std::shared_ptr<TagData>>& tags, std::string& text) {
+            return RunBlockingToFinish(
+                client,
+                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
+                    return (client.*start)(tags, request, id, timeoutMs, out);
+                },
+                text);
+        });
+}
+
 }  // namespace
 
 int32_t TagConsoleGetKeywords(uint32_t tagReference, bool verbose,
@@ -94,28 +110,11 @@ int32_t TagConsoleSetCollectAggregates(uint32_t tagReference, bool collectAggreg
 
 int32_t TagConsoleResetAggregates(uint64_t instanceId, const std::vector<uint32_t>* tagReferences,
                                   bool verbose, std::string* error) {
-    return RunOnConsoleReferences(
-        instanceId, tagReferences, verbose, error,
-        [&](Client& client, const std::vector<std::shared_ptr<TagData>>& tags, std::string& text) {
-            return RunBlockingToFinish(
-                client,
-                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
-                    return client.ResetAggregates(tags, request, id, timeoutMs, out);
-                },
-                text);
-        });
+    return OnConsoleReferences(instanceId, tagReferences, verbose, error,
+                               &Client::ResetAggregates);
 }
 
 int32_t TagConsoleDeleteTag(uint64_t instanceId, const std::vector<uint32_t>* tagReferences,
                             bool verbose, std::string* error) {
-    return RunOnConsoleReferences(
-        instanceId, tagReferences, verbose, error,
-        [&](Client& client, const std::vector<std::shared_ptr<TagData>>& tags, std::string& text) {
-            return RunBlockingToFinish(
-                client,
-                [&](const RequestPtr& request, uint32_t& id, uint32_t& timeoutMs, std::string& out) {
-                    return client.DeleteTags(tags, request, id, timeoutMs, out);
-                },
-                text);
-        });
+    return OnConsoleReferences(instanceId, tagReferences, verbose, error, &Client::DeleteTags);
 }
