@@ -1,6 +1,6 @@
 #include "taglibrary/exports/ErrorOut.h"
 
-#include "taglibrary/exports/HostStrings.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 
 namespace Korvane::Veldra::TagLibrary {
 

@@ -1,7 +1,7 @@
 // The argument forms of the two initialize functions, ahead of the steps
 // that both share.
 #include "taglibrary/exports/ErrorOut.h"
-#include "taglibrary/exports/HostStrings.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 #include "taglibrary/exports/Instances.h"
 
 namespace Korvane::Veldra::TagLibrary {

@@ -1,7 +1,7 @@
 #include "taglibrary/requests/WBDynamicSignal.h"
 
 #include "errors/VeldraException.h"
-#include "taglibrary/exports/HostRuntime.h"
+#include "taglibrary/exports/wb/HostRuntime.h"
 
 namespace kvsup::wb {
 

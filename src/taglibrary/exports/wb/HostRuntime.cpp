@@ -1,4 +1,4 @@
-#include "taglibrary/exports/HostRuntime.h"
+#include "taglibrary/exports/wb/HostRuntime.h"
 
 #include <dlfcn.h>
 

@@ -1,10 +1,10 @@
 #include <gtest/gtest.h>
 
-#include "FrameTestSupport.h"
+#include "../FrameTestSupport.h"
 #include "WBHostRuntime.h"
 #include "kvveldra/TagWB.h"
 #include "taglibrary/exports/Frame.h"
-#include "taglibrary/exports/HostStrings.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 
 using namespace Korvane::Veldra::TagLibrary;
 using FrameTestSupport::ReservedProcess;

@@ -1,4 +1,4 @@
-#include "taglibrary/exports/HostTime.h"
+#include "taglibrary/exports/wb/HostTime.h"
 
 #include <boost/date_time/gregorian/gregorian_types.hpp>
 #include <cmath>

@@ -2,7 +2,7 @@
 #include "errors/ErrorCodes.h"
 #include "kvveldra/TagWB.h"
 #include "taglibrary/exports/ErrorOut.h"
-#include "taglibrary/exports/HostStrings.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 #include "taglibrary/exports/Instances.h"
 
 using namespace Korvane::Veldra::TagLibrary;

@@ -1,10 +1,10 @@
-#include "taglibrary/exports/HostStrings.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 
 #include <algorithm>
 #include <cstring>
 #include <limits>
 
-#include "taglibrary/exports/HostRuntime.h"
+#include "taglibrary/exports/wb/HostRuntime.h"
 
 namespace Korvane::Veldra::TagLibrary {
 

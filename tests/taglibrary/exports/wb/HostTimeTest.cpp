@@ -3,7 +3,7 @@
 #include <boost/date_time/gregorian/gregorian_types.hpp>
 #include <stdexcept>
 
-#include "taglibrary/exports/HostTime.h"
+#include "taglibrary/exports/wb/HostTime.h"
 
 using namespace Korvane::Veldra::TagLibrary;
 namespace pt = boost::posix_time;
