@@ -28,6 +28,22 @@ bool ShouldFail() {
     return false;
 }
 
+// The failures WbVariantFailNextCalls asked for: the count in the high half and
+// the status in the low half, so that a call takes a failure and its status in
+// one step.
+std::atomic<uint64_t> gFailVariantCalls{0};
+
+// The status of a variant call that is to fail, else 0.
+int32_t TakeVariantFailure() {
+    uint64_t packed = gFailVariantCalls.load();
+    while ((packed >> 32) != 0) {
+        if (gFailVariantCalls.compare_exchange_weak(packed, packed - (uint64_t{1} << 32))) {
+            return static_cast<int32_t>(static_cast<uint32_t>(packed));
+        }
+    }
+    return 0;
+}
+
 BlockHeader* HeaderOf(void* block) {
     return static_cast<BlockHeader*>(block) - 1;
 }
@@ -41,8 +57,11 @@ void* NewBlock(size_t size) {
 
 struct Signals {
     std::mutex mutex;
-    std::condition_variable fired;
-    std::map<uint32_t, bool> states;  // signal number to fired flag
+    std::condition_variable changed;  // a signal fired, was freed, or a fire was tried
+    std::map<uint32_t, bool> states;  // allocated signal number to fired flag
+    // Signal number to the WBFireSignal calls with it since its allocation,
+    // counted also while it was freed or unknown.
+    std::map<uint32_t, uint64_t> fireAttempts;
     uint32_t next = 1;
 };
 
@@ -111,36 +130,57 @@ uint32_t WBAllocSignal(void) {
     while (table.next == 0 || table.states.count(table.next) != 0) ++table.next;
     const uint32_t signal = table.next++;
     table.states[signal] = false;
+    table.fireAttempts.erase(signal);
     return signal;
 }
 
 int32_t WBFreeSignal(uint32_t signal) {
     auto& table = SignalTable();
-    std::lock_guard<std::mutex> lock(table.mutex);
-    return table.states.erase(signal) == 1 ? 0 : 1;
+    {
+        std::lock_guard<std::mutex> lock(table.mutex);
+        if (table.states.erase(signal) == 0) return 1;
+    }
+    // Waits on it end now, with 0.
+    table.changed.notify_all();
+    return 0;
 }
 
 int32_t WBFireSignal(uint32_t signal) {
     auto& table = SignalTable();
+    int32_t status = 1;
     {
         std::lock_guard<std::mutex> lock(table.mutex);
+        ++table.fireAttempts[signal];
         const auto found = table.states.find(signal);
-        if (found == table.states.end()) return 1;
-        found->second = true;
+        if (found != table.states.end()) {
+            found->second = true;
+            status = 0;
+        }
     }
-    table.fired.notify_all();
-    return 0;
+    table.changed.notify_all();
+    return status;
 }
 
 int32_t WBWaitSignal(uint32_t signal, uint32_t timeoutMs) {
     auto& table = SignalTable();
     std::unique_lock<std::mutex> lock(table.mutex);
-    const bool fired = table.fired.wait_for(lock, std::chrono::milliseconds(timeoutMs), [&] {
+    // Ends early when the signal fires or is freed; only a fire counts.
+    table.changed.wait_for(lock, std::chrono::milliseconds(timeoutMs), [&] {
         const auto found = table.states.find(signal);
         return found == table.states.end() || found->second;
     });
     const auto found = table.states.find(signal);
-    return fired && found != table.states.end() && found->second ? 1 : 0;
+    return found != table.states.end() && found->second ? 1 : 0;
+}
+
+int32_t WBWaitFireAttempt(uint32_t signal, uint32_t timeoutMs) {
+    auto& table = SignalTable();
+    std::unique_lock<std::mutex> lock(table.mutex);
+    const bool tried = table.changed.wait_for(lock, std::chrono::milliseconds(timeoutMs), [&] {
+        const auto found = table.fireAttempts.find(signal);
+        return found != table.fireAttempts.end() && found->second > 0;
+    });
+    return tried ? 1 : 0;
 }
 
 void* WbVariantGetDataPtr(WbVariant* variant) {
@@ -163,7 +203,14 @@ int32_t WbVariantGetType(const WbVariant* variant) {
     return variant == nullptr ? WbVariantEmpty : variant->type;
 }
 
+void WbVariantFailNextCalls(int32_t count, int32_t status) {
+    const bool on = count > 0 && status != 0;
+    gFailVariantCalls.store(
+        on ? (static_cast<uint64_t>(count) << 32) | static_cast<uint32_t>(status) : 0);
+}
+
 int32_t WbVariantNestInVariant(WbVariant** slot) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (slot == nullptr) return 1;
     WbVariantFree(*slot);
     *slot = new WbVariant();
@@ -179,30 +226,35 @@ static int32_t Reset(WbVariant* variant, int32_t type) {
 }
 
 int32_t WbVariantSetDBL(WbVariant* variant, double value) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (Reset(variant, WbVariantDouble) != 0) return 1;
     variant->value.d = value;
     return 0;
 }
 
 int32_t WbVariantSetI32(WbVariant* variant, int32_t value) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (Reset(variant, WbVariantI32) != 0) return 1;
     variant->value.i = value;
     return 0;
 }
 
 int32_t WbVariantSetUI32(WbVariant* variant, uint32_t value) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (Reset(variant, WbVariantUI32) != 0) return 1;
     variant->value.u = value;
     return 0;
 }
 
 int32_t WbVariantSetBool(WbVariant* variant, uint8_t value) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (Reset(variant, WbVariantBool) != 0) return 1;
     variant->value.b = value;
     return 0;
 }
 
 int32_t WbVariantSetLStr(WbVariant* variant, WBStrHandle value) {
+    if (const int32_t failure = TakeVariantFailure()) return failure;
     if (Reset(variant, WbVariantLStr) != 0) return 1;
     // The variant keeps a copy of its own.
     const int32_t length = (value != nullptr && *value != nullptr) ? (*value)->cnt : 0;

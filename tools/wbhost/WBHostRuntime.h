@@ -26,8 +26,14 @@ void WBFailNextAllocations(int32_t count); /* emulator only: next N allocations 
 uint32_t WBAllocSignal(void);
 int32_t WBFreeSignal(uint32_t signal);
 int32_t WBFireSignal(uint32_t signal);
-/* Emulator only: 1 when the signal was fired within the time, else 0. */
+/* Emulator only: 1 when the signal was fired within the time, else 0; also 0
+ * as soon as the signal is freed. */
 int32_t WBWaitSignal(uint32_t signal, uint32_t timeoutMs);
+/* Emulator only: 1 as soon as WBFireSignal was called with this number at
+ * least once since it was allocated, also while it was freed or never
+ * allocated (those calls still return non-zero); 0 when none came within the
+ * time. */
+int32_t WBWaitFireAttempt(uint32_t signal, uint32_t timeoutMs);
 
 /* Variants. */
 enum WbVariantType {
@@ -48,6 +54,10 @@ int32_t WbVariantSetLStr(WbVariant* variant, WBStrHandle value);
 WbVariant* WbVariantNew(void);                      /* emulator only */
 void WbVariantFree(WbVariant* variant);             /* emulator only */
 int32_t WbVariantGetType(const WbVariant* variant); /* emulator only */
+/* Emulator only: the next `count` calls of WbVariantNestInVariant and the
+ * WbVariantSet* functions return `status` and change nothing. A count of 0 or
+ * less, or a status of 0, switches the failures off. */
+void WbVariantFailNextCalls(int32_t count, int32_t status);
 
 #ifdef __cplusplus
 }
