@@ -4,30 +4,15 @@
 
 #include <atomic>
 
-#include "support/ScratchDirectory.h"
-
 namespace Korvane::Veldra::Testing {
 
-std::unique_ptr<TagServiceProcess> ConsoleBrokerTest::service;
-
-namespace {
-
-ScratchDirectory& StoreDirectory() {
-    static ScratchDirectory directory{"kvveldra-console"};
-    return directory;
+SuiteTagService& ConsoleBrokerTest::Suite() {
+    static SuiteTagService suite{"kvveldra-console"};
+    return suite;
 }
 
-}  // namespace
-
-bool ConsoleBrokerTest::attempted = false;
-bool ConsoleBrokerTest::ready = false;
-
 void ConsoleBrokerTest::SetUp() {
-    if (!attempted) {
-        attempted = true;
-        StartSuite();
-    }
-    ASSERT_TRUE(ready) << "the tag service or the console instance did not start (see above)";
+    ASSERT_TRUE(Suite().EnsureSuite(StartSuite)) << "the tag service or the instance did not start (see above)";
 }
 
 void ConsoleBrokerTest::StartSuite() {
@@ -38,7 +23,6 @@ void ConsoleBrokerTest::StartSuite() {
     ASSERT_EQ(TagConsoleReserve(&reserved), 0);
     std::string error;
     ASSERT_EQ(TagConsoleInitialize(0, nullptr, nullptr, nullptr, &error), 0) << error;
-    ready = true;
 }
 
 void ConsoleBrokerTest::TearDownTestSuite() {
@@ -48,14 +32,11 @@ void ConsoleBrokerTest::TearDownTestSuite() {
 }
 
 void ConsoleBrokerTest::StartService() {
-    TagServiceOptions options;
-    options.store = StoreDirectory().Path() + "/tags.db";
-    service = std::make_unique<TagServiceProcess>(options);
+    Suite().Start();
 }
 
 void ConsoleBrokerTest::StopService() {
-    if (service) service->Stop();
-    service.reset();
+    Suite().Stop();
 }
 
 std::string ConsoleBrokerTest::UniquePath(const std::string& stem) {

@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "kvveldra/TagConsole.h"
-#include "support/TagServiceProcess.h"
+#include "support/SuiteTagService.h"
 
 namespace Korvane::Veldra::Testing {
 
@@ -48,12 +48,9 @@ protected:
     // Closes `count` times, each with status 0.
     static void Close(uint32_t reference, int count = 1);
 
-    static std::unique_ptr<TagServiceProcess> service;
-
 private:
+    static SuiteTagService& Suite();
     static void StartSuite();
-    static bool attempted;
-    static bool ready;
 };
 
 }  // namespace Korvane::Veldra::Testing
