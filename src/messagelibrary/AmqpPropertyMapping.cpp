@@ -60,13 +60,17 @@ MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::stri
         FlaggedText(properties, kCorrelationId, properties.correlationId);
     headers.correlationId = correlationId.substr(0, correlationId.find('\0'));
 
+    if (HasFlag(properties, kHeaders)) {
+        for (const auto& entry : properties.headers) headers.SetHeader(entry.key, entry.value);
+    }
+    // The values computed here are written after the sender's table on
+    // purpose: a message re-published with the headers it was received with
+    // carries the first receiver's consumer tag, and with that tag a manual
+    // acknowledgement would find no consumer and do nothing.
     const bool persistent =
         properties.flags != 0 && properties.deliveryMode == kPersistentDeliveryMode;
     headers.SetHeader(HeaderKeys::kPersistent, std::string(persistent ? "true" : "false"));
     headers.SetHeader(HeaderKeys::kConsumerTag, consumerTag);
-    if (HasFlag(properties, kHeaders)) {
-        for (const auto& entry : properties.headers) headers.SetHeader(entry.key, entry.value);
-    }
     headers.SetDeliveryTag(deliveryTag);
     return headers;
 }

@@ -19,10 +19,11 @@ AmqpProperties ToAmqpProperties(const MessageHeaders& headers);
 
 // The headers of a received message. The timestamp property is taken as
 // milliseconds (while senders write seconds), the correlation id ends at its
-// first zero byte, "Persistent" is "true" or "false" from the delivery mode,
-// "ConsumerTag" is the local consumer's tag, then every entry of the header
-// table is copied as bytes, replacing what is there, and last "DeliveryTag"
-// gets the low 32 bits of the delivery tag.
+// first zero byte, every entry of the header table is copied as bytes, then
+// the local values replace what the sender's table held under their keys:
+// "Persistent" is "true" or "false" from the delivery mode, "ConsumerTag" is
+// the local consumer's tag and "DeliveryTag" the low 32 bits of the delivery
+// tag.
 MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::string& routingKey,
                                const std::string& consumerTag, uint64_t deliveryTag);
 

@@ -99,14 +99,17 @@ TEST(AmqpPropertyMapping, ReceivedCorrelationIdEndsAtItsFirstZeroByte) {
     EXPECT_EQ(HeadersFromAmqp(properties, "", "", 1).correlationId, "abc");
 }
 
-TEST(AmqpPropertyMapping, ReceivedTableEntriesReplaceLocalHeadersButNotTheDeliveryTag) {
+TEST(AmqpPropertyMapping, ReceivedTableEntriesNeverReplaceTheLocalHeaders) {
     AmqpProperties properties = Received(2);
+    // As a message re-published with the headers it was received with.
     properties.headers = {{"Persistent", 'S', "0"},
+                          {"ConsumerTag", 'S', "foreign-ctag"},
                           {"DeliveryTag", 'S', "999"},
                           {"Origin", 'S', std::string("a\0b", 3)},
                           {"Count", 'I', "raw"}};
     const MessageHeaders headers = HeadersFromAmqp(properties, "", "ctag", 5);
-    EXPECT_EQ(*headers.GetHeader(HeaderKeys::kPersistent), "0");
+    EXPECT_EQ(*headers.GetHeader(HeaderKeys::kPersistent), "true");
+    EXPECT_EQ(headers.ConsumerTag(), "ctag");
     EXPECT_EQ(headers.DeliveryTag(), 5u);
     EXPECT_EQ(headers.Origin(), std::string("a\0b", 3));
     EXPECT_EQ(*headers.GetHeader("Count"), "raw");
@@ -136,9 +139,10 @@ TEST(AmqpPropertyMapping, SentHeadersArriveWithTheLocalOnesAdded) {
     EXPECT_EQ(received.correlationId, sent.correlationId);
     EXPECT_EQ(received.routingKey, sent.routingKey);
     EXPECT_EQ(received.ReplyTo(), "client_q");
-    // The sender's "0" comes through the table and wins over the computed "true".
-    EXPECT_EQ(*received.GetHeader(HeaderKeys::kPersistent), "0");
+    // The sender's "0" travels in the table; the delivery mode it asked for wins.
+    EXPECT_EQ(*received.GetHeader(HeaderKeys::kPersistent), "true");
     MessageHeaders expected = sent;
+    expected.SetHeader(HeaderKeys::kPersistent, "true");
     expected.SetHeader(HeaderKeys::kConsumerTag, "ctag");
     expected.SetDeliveryTag(3);
     EXPECT_EQ(received.headers, expected.headers);

@@ -12,8 +12,9 @@ namespace Korvane::Veldra::MessageBus {
 
 // The headers of a delivery: type, content type and routing key by their
 // lengths, the correlation id up to its first zero byte, the timestamp read
-// as milliseconds, "Persistent" from the delivery mode, "ConsumerTag", every
-// entry of the header table, and last "DeliveryTag" from the envelope.
+// as milliseconds, every entry of the header table, then the local
+// "Persistent" from the delivery mode, "ConsumerTag", and "DeliveryTag" from
+// the envelope, which win over table entries of the same keys.
 MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope, const std::string& consumerTag);
 
 // The received message: those headers and a copy of the body, so that it
