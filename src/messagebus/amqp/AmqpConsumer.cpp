@@ -114,6 +114,8 @@ void AmqpConsumer::RebindLoop() {
             // restores the consumer on a new connection or channel.
             try {
                 DeclareQueue();
+                // A reopened channel or a new connection has lost the prefetch.
+                Manager->SetQos(Channel, 0, PrefetchCount, false);
                 Manager->RebindAll(Channel, !ManualAck);
             } catch (const std::exception& error) {
                 Manager->SetLastError(AsVeldraException(error));
@@ -164,11 +166,20 @@ void AmqpConsumer::HandleOnce() {
 bool AmqpConsumer::Recover(const std::string& line) {
     try {
         ReportLine(line);
+    } catch (...) {
+        // A failing logger must not end the thread: the line goes to the
+        // manager's log instead, if it can.
+        try {
+            Manager->Log(line);
+        } catch (...) {
+        }
+    }
+    try {
         // Declare and bind anew: the failure may have left the channel unusable.
         Channel->ChannelReset.Release();
         return StopSignal.Acquire(kWaitMs);
     } catch (...) {
-        return true;
+        return StopHandling.load();
     }
 }
 

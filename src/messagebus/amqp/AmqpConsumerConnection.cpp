@@ -1,7 +1,6 @@
 #include "messagebus/amqp/AmqpConsumerConnection.h"
 
 #include <chrono>
-#include <new>
 #include <thread>
 #include <utility>
 
@@ -77,6 +76,12 @@ std::shared_ptr<AmqpChannel> AmqpConsumerConnection::CreateChannel() {
 void AmqpConsumerConnection::CloseChannel(uint16_t channelId) {
     ControlGateGuard gate(Gate);
     std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    if (IsClosed(channelId)) {
+        // Closed and answered already; a second close would be a protocol error.
+        ClosedChannels.erase(channelId);
+        Channels.erase(channelId);
+        return;
+    }
     AmqpPollingConnection::CloseChannel(channelId);
 }
 
@@ -105,6 +110,7 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
                                 ". Auto Delete: " + Flag(autoDelete) + ". ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kDeclaringQueue, context);
+    ReopenIfClosed(channelId);
     amqp_queue_declare_ok_t* declared = nullptr;
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
@@ -112,7 +118,7 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
             amqp_queue_declare(Connection, channelId, TextBytes(queueName), 0, durable ? 1 : 0,
                                exclusive ? 1 : 0, autoDelete ? 1 : 0, amqp_empty_table);
     }
-    CheckReply(LastReply(), ErrorCodes::kDeclaringQueue, context);
+    CheckChannelReply(channelId, ErrorCodes::kDeclaringQueue, context);
     if (declared == nullptr || declared->queue.len == 0) {
         throw AmqpException(ErrorCodes::kObtainingQueueName, "Error obtaining queue name.");
     }
@@ -129,19 +135,20 @@ void AmqpConsumerConnection::BindAndConsume(uint16_t channelId, const std::strin
         ". Queue name: \"" + queueName + "\". ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kBindingQueue, bindContext);
+    ReopenIfClosed(channelId);
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_queue_bind(Connection, channelId, TextBytes(queueName),
                         amqp_cstring_bytes(ExchangeName.c_str()), TextBytes(key), amqp_empty_table);
     }
-    CheckReply(LastReply(), ErrorCodes::kBindingQueue, bindContext);
+    CheckChannelReply(channelId, ErrorCodes::kBindingQueue, bindContext);
     {
         // The broker names the consumer; its tag is not kept.
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_basic_consume(Connection, channelId, TextBytes(queueName), amqp_empty_bytes, 0,
                            noAck ? 1 : 0, 0, amqp_empty_table);
     }
-    CheckReply(LastReply(), ErrorCodes::kPerformingBasicConsume, consumeContext);
+    CheckChannelReply(channelId, ErrorCodes::kPerformingBasicConsume, consumeContext);
 }
 
 void AmqpConsumerConnection::Unbind(uint16_t channelId, const std::string& queueName,
@@ -152,19 +159,20 @@ void AmqpConsumerConnection::Unbind(uint16_t channelId, const std::string& queue
                                 ExchangeName + "\". Binding key: \"" + key + "\". ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kUnbindingQueue, context);
+    ReopenIfClosed(channelId);
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_queue_unbind(Connection, channelId, TextBytes(queueName),
                           amqp_cstring_bytes(ExchangeName.c_str()), TextBytes(key),
                           amqp_empty_table);
     }
-    CheckReply(LastReply(), ErrorCodes::kUnbindingQueue, context);
+    CheckChannelReply(channelId, ErrorCodes::kUnbindingQueue, context);
 }
 
 void AmqpConsumerConnection::Ack(uint16_t channelId, uint64_t deliveryTag) {
     if (deliveryTag == 0) return;
     ControlGateGuard gate(Gate);
-    if (Connection == nullptr) return;
+    if (Connection == nullptr || IsClosed(channelId)) return;
     SocketWatchdog::Scope watch(Watchdog, Connection);
     amqp_basic_ack(Connection, channelId, deliveryTag, 0);
 }
@@ -172,7 +180,7 @@ void AmqpConsumerConnection::Ack(uint16_t channelId, uint64_t deliveryTag) {
 void AmqpConsumerConnection::Requeue(uint16_t channelId, uint64_t deliveryTag) {
     if (deliveryTag == 0) return;
     ControlGateGuard gate(Gate);
-    if (Connection == nullptr) return;
+    if (Connection == nullptr || IsClosed(channelId)) return;
     SocketWatchdog::Scope watch(Watchdog, Connection);
     amqp_basic_nack(Connection, channelId, deliveryTag, 0, 1);
 }
@@ -186,6 +194,54 @@ void AmqpConsumerConnection::DeliverReturnedMessage(const ResetEvent& event) {
     DeliverReturnEvent(event);
 }
 
+void AmqpConsumerConnection::OnChannelClosed(amqp_channel_t channel) {
+    AnswerChannelClose(channel);
+    AmqpPollingConnection::OnChannelClosed(channel);
+}
+
+void AmqpConsumerConnection::AnswerChannelClose(uint16_t channelId) {
+    // Until the close-ok the broker drops every frame on the channel, and a
+    // declaration sent there would wait for its answer until the watchdog
+    // cut the whole connection.
+    amqp_channel_close_ok_t closeOk{};
+    const int status =
+        amqp_send_method(Connection, channelId, AMQP_CHANNEL_CLOSE_OK_METHOD, &closeOk);
+    if (status != AMQP_STATUS_OK) {
+        // The socket is failing: the reader's next poll starts a reconnect.
+        Log(LibraryExceptionLine(status));
+        return;
+    }
+    ClosedChannels[channelId] = Connection;
+}
+
+void AmqpConsumerConnection::ReopenIfClosed(uint16_t channelId) {
+    const auto found = ClosedChannels.find(channelId);
+    if (found == ClosedChannels.end()) return;
+    if (found->second == Connection) {
+        SocketWatchdog::Scope watch(Watchdog, Connection);
+        OpenChannel(channelId);
+    }
+    ClosedChannels.erase(channelId);
+}
+
+bool AmqpConsumerConnection::IsClosed(uint16_t channelId) const {
+    const auto found = ClosedChannels.find(channelId);
+    return found != ClosedChannels.end() && found->second == Connection;
+}
+
+void AmqpConsumerConnection::CheckChannelReply(uint16_t channelId, int32_t code,
+                                               const std::string& context) {
+    const amqp_rpc_reply_t reply = LastReply();
+    if (reply.reply_type == AMQP_RESPONSE_NORMAL) return;
+    // The text first: the answer may reuse what the reply points into.
+    const AmqpException error(code, context + ReplyText(reply), reply.library_error);
+    if (reply.reply_type == AMQP_RESPONSE_SERVER_EXCEPTION &&
+        reply.reply.id == AMQP_CHANNEL_CLOSE_METHOD) {
+        AnswerChannelClose(channelId);
+    }
+    throw error;
+}
+
 void AmqpConsumerConnection::OnReconnected() {
     std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
     for (const auto& entry : Channels) entry.second->ChannelReset.Release();
@@ -194,11 +250,18 @@ void AmqpConsumerConnection::OnReconnected() {
 void AmqpConsumerConnection::ReaderLoop() {
     try {
         while (!Disconnected) ReaderStep();
-    } catch (const std::bad_alloc&) {
-        // Nothing more can be taken in.
+        return;
     } catch (const std::exception& error) {
-        Log(std::string("Consumer reader stopped: ") + error.what());
+        try {
+            const std::string line = std::string("Consumer reader stopped: ") + error.what();
+            Log(line);
+            ReportError(VeldraException(ErrorCodes::kException, line));
+        } catch (...) {
+            // Out of memory: the reconnect below matters more than the report.
+        }
     }
+    // Without a reader nothing arrives: start again as after a lost connection.
+    Disconnect();
 }
 
 void AmqpConsumerConnection::ReaderStep() {

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include "messagebus/amqp/AmqpPollingConnection.h"
@@ -48,13 +49,17 @@ public:
                         const std::vector<std::string>& keys, bool noAck);
     void Unbind(uint16_t channelId, const std::string& queueName,
                 const std::vector<std::string>& keys);
-    // A delivery tag of 0 does nothing.
+    // A delivery tag of 0 does nothing, and so does a channel the broker
+    // closed: its delivery tags went with it.
     void Ack(uint16_t channelId, uint64_t deliveryTag);
-    // Gives the message back to the queue; a delivery tag of 0 does nothing.
+    // Gives the message back to the queue; does nothing where Ack does.
     void Requeue(uint16_t channelId, uint64_t deliveryTag);
     // A copy of the notice to the return queue of every channel.
     void DeliverReturnEvent(const ResetEvent& event);
 
+    // Polls until the connection is lost or stopped. A poll that throws ends
+    // the loop like a lost connection: the error goes to the manager's last
+    // error and a reconnect starts.
     void ReaderLoop() override;
 
     // Start calls not yet matched by Stop.
@@ -71,12 +76,29 @@ protected:
     // bind again on the new connection.
     void OnReconnected() override;
     void DeliverReturnedMessage(const ResetEvent& event) override;
+    // Answers with close-ok and marks the channel closed before its reset is
+    // posted, so that the consumer's next declaration opens it again.
+    void OnChannelClosed(amqp_channel_t channel) override;
+
+    // One poll of the reader loop; virtual so that a test can make it fail.
+    virtual void ReaderStep();
 
 private:
-    void ReaderStep();
+    // Sends channel.close-ok and marks the channel closed. Gate held.
+    void AnswerChannelClose(uint16_t channelId);
+    // Opens a channel the broker closed on this connection again. Gate held.
+    void ReopenIfClosed(uint16_t channelId);
+    bool IsClosed(uint16_t channelId) const;
+    // CheckReply for a call on the channel; a channel.close in the reply is
+    // answered first.
+    void CheckChannelReply(uint16_t channelId, int32_t code, const std::string& context);
 
     // ---- State ----
     int32_t StartCount = 0;
+    // Channels the broker closed, each with the connection it closed them on:
+    // a mark from an earlier connection is void, as Connect opened every
+    // channel again. Guarded by the gate.
+    std::unordered_map<uint16_t, amqp_connection_state_t> ClosedChannels;
 };
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -97,13 +97,9 @@ void AmqpPollingConnection::Deliver(const EnvelopePtr& envelope) {
 }
 
 void AmqpPollingConnection::HandleMethod(amqp_method_number_t method, amqp_channel_t channel) {
-    // Closes are not answered with a close-ok: the socket is replaced.
     switch (method) {
         case AmqpMethodIds::kChannelClose:
-            if (const auto closed = FindChannel(channel)) {
-                Log("AMQP channel was unexpectedly closed.");
-                closed->ChannelReset.Release();
-            }
+            OnChannelClosed(channel);
             break;
         case AmqpMethodIds::kConnectionClose:
             Log(texts_.connectionClosed);
@@ -119,6 +115,13 @@ void AmqpPollingConnection::HandleMethod(amqp_method_number_t method, amqp_chann
         default:
             Log(UnexpectedMethodLine(method));
             break;
+    }
+}
+
+void AmqpPollingConnection::OnChannelClosed(amqp_channel_t channel) {
+    if (const auto closed = FindChannel(channel)) {
+        Log("AMQP channel was unexpectedly closed.");
+        closed->ChannelReset.Release();
     }
 }
 

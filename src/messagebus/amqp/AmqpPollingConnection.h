@@ -66,6 +66,9 @@ protected:
     virtual void OnReconnected() {}
     // Where the notice of a returned message goes.
     virtual void DeliverReturnedMessage(const ResetEvent& event) = 0;
+    // The broker closed the channel; called by the reader with the gate held.
+    // Logs and posts the channel's reset.
+    virtual void OnChannelClosed(amqp_channel_t channel);
     // How long one socket call may run before its socket is shut down: one
     // heartbeat interval, after which the broker itself gives a silent peer
     // up.
