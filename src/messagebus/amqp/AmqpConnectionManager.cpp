@@ -84,13 +84,30 @@ int32_t AmqpConnectionManager::GetConnectTimeout() const {
 
 template <typename Connection>
 std::shared_ptr<Connection> AmqpConnectionManager::GetOrMake(std::shared_ptr<Connection>& field) {
-    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
-    if (!field) {
-        field = std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
-                                             TlsServerName, CertPath, ConnectTimeoutMs,
-                                             HeartbeatSeconds);
+    int32_t connectTimeoutMs = 0;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        if (field) return field;
+        connectTimeoutMs = ConnectTimeoutMs;
     }
-    return field;
+    // The connect runs without the class-wide mutex: a broker that takes its
+    // whole time-out to answer must not hold up the other managers of the
+    // process, their reconnect threads included. The other settings are
+    // fixed at construction.
+    auto made = std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
+                                             TlsServerName, CertPath, connectTimeoutMs,
+                                             HeartbeatSeconds);
+    std::shared_ptr<Connection> kept;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        if (!field) field = made;
+        kept = field;
+    }
+    // A caller that connected at the same time won: this connection is
+    // released here, without the mutex, since its threads take the mutex to
+    // report until they are joined.
+    made.reset();
+    return kept;
 }
 
 std::shared_ptr<AmqpPublisherConnection> AmqpConnectionManager::GetPublisherConnection() {
