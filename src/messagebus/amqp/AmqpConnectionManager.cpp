@@ -95,9 +95,9 @@ std::shared_ptr<Connection> AmqpConnectionManager::GetOrMake(std::shared_ptr<Con
     // whole time-out to answer must not hold up the other managers of the
     // process, their reconnect threads included. The other settings are
     // fixed at construction.
-    auto made = std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
-                                             TlsServerName, CertPath, connectTimeoutMs,
-                                             HeartbeatSeconds);
+    auto made =
+        std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
+                                     TlsServerName, CertPath, connectTimeoutMs, HeartbeatSeconds);
     std::shared_ptr<Connection> kept;
     {
         std::lock_guard<std::recursive_mutex> lock(ManagerMutex);

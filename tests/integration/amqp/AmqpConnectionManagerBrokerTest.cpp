@@ -81,7 +81,8 @@ TEST(AmqpConnectionManagerBroker, MakesEachConnectionOnceAndBindsOnlyOnChange) {
     {
         AmqpConnectionManager manager(BrokerRecord("kvveldra.amqpconn.manager", Broker().Password));
         // Two first uses at once: both connect, one connection is kept.
-        auto racing = std::async(std::launch::async, [&] { return manager.GetPublisherConnection(); });
+        auto racing =
+            std::async(std::launch::async, [&] { return manager.GetPublisherConnection(); });
         const auto publisher = manager.GetPublisherConnection();
         ASSERT_EQ(racing.wait_for(60s), std::future_status::ready);
         EXPECT_EQ(racing.get(), publisher);

@@ -30,8 +30,9 @@ TEST(AmqpConnectionManager, NullChannelIsRefusedBeforeAnyConnectionIsTried) {
     // logs its first line.
     AmqpConnectionManager manager{VeldraConfiguration{}};
     manager.SetConnectTimeout(0);
-    for (const auto& call : {std::function<void()>([&] { manager.AddBinding(nullptr, "q", {"k"}, true); }),
-                             std::function<void()>([&] { manager.SetQos(nullptr, 0, 1, false); })}) {
+    for (const auto& call :
+         {std::function<void()>([&] { manager.AddBinding(nullptr, "q", {"k"}, true); }),
+          std::function<void()>([&] { manager.SetQos(nullptr, 0, 1, false); })}) {
         try {
             call();
             ADD_FAILURE() << "a null channel was taken";

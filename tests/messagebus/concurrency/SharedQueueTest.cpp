@@ -15,8 +15,8 @@
 namespace Korvane::Veldra::MessageBus {
 namespace {
 
-using Testing::CatchVeldra;
 using ::Korvane::Veldra::Testing::SpinUntil;
+using Testing::CatchVeldra;
 
 TEST(SharedQueue, ItemsLeaveInArrivalOrderAndAnEmptyQueueGivesNothing) {
     SharedQueue<std::unique_ptr<int>> queue;
