@@ -166,13 +166,13 @@ void AmqpConnection::Connect() {
 
     BoundSilentPeer(state.get());
     if (ConnectTimeoutMs >= 0) BoundHandshake(state.get(), deadline);
+    CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
+                          User.c_str(), Password.c_str()),
+               ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
     // Without it an RPC waits for its answer as long as heartbeats allow, or
     // for ever when they are off; the reconnect thread's own RPCs (the
     // channels opened again below) have nobody else to watch them.
     SetRpcTimeout(state.get(), std::chrono::duration_cast<milliseconds>(StallLimit() / 2));
-    CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
-                          User.c_str(), Password.c_str()),
-               ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
 
     // Nobody else can be using the replaced state: every call takes the gate.
     if (Connection != nullptr) amqp_destroy_connection(Connection);
