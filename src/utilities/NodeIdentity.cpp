@@ -45,7 +45,9 @@ std::string GetHostName() {
 }
 
 std::string ComputeNodeName(const std::string& configDirectory) {
-    const char* fromEnvironment = std::getenv("VELDRA_NODENAME");
+    // secure_getenv: under set-user-ID or set-group-ID the caller does not
+    // get to name the node.
+    const char* fromEnvironment = secure_getenv("VELDRA_NODENAME");
     if (fromEnvironment != nullptr && *fromEnvironment != '\0') {
         return ToLowerClassic(fromEnvironment);
     }

@@ -10,7 +10,9 @@ namespace Korvane::Veldra::VeldraUtilities {
 namespace {
 
 std::string ReadDataDirectory() {
-    const char* overridden = std::getenv("VELDRA_DATA_DIR");
+    // secure_getenv: a set-user-ID or set-group-ID program must not let its
+    // caller move the data root (and with it the configuration and keys).
+    const char* overridden = secure_getenv("VELDRA_DATA_DIR");
     if (overridden != nullptr && *overridden != '\0') return overridden;
     return "/etc/korvane/kvveldra";
 }

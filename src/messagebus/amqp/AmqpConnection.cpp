@@ -4,6 +4,7 @@
 #include <amqp_tcp_socket.h>
 #include <netinet/in.h>
 #include <netinet/tcp.h>
+#include <poll.h>
 #include <sys/socket.h>
 #include <sys/time.h>
 
@@ -42,6 +43,12 @@ constexpr int kKeepAliveIntervalSeconds = 10;
 constexpr int kKeepAliveProbes = 3;
 constexpr unsigned kUserTimeoutMs = 60000;
 
+// The stall limit when heartbeats are off, and the least one.
+constexpr int32_t kStallSecondsWithoutHeartbeat = 270;
+constexpr int32_t kShortestStallSeconds = 5;
+// The longest wait for the broker's close-ok: the connection goes either way.
+constexpr milliseconds kLongestCloseWait(3000);
+
 // The statuses after which another attempt can succeed; each has used up its
 // attempt's time except a refused connection (socket error).
 bool IsRetriedOpenStatus(int status) {
@@ -78,6 +85,21 @@ void BoundHandshake(amqp_connection_state_t state, steady_clock::time_point dead
     timeval timeout{static_cast<time_t>(left.count() / 1000),
                     static_cast<suseconds_t>((left.count() % 1000) * 1000)};
     amqp_set_handshake_timeout(state, &timeout);
+}
+
+void SetRpcTimeout(amqp_connection_state_t state, milliseconds timeout) {
+    timeval value{static_cast<time_t>(timeout.count() / 1000),
+                  static_cast<suseconds_t>((timeout.count() % 1000) * 1000)};
+    amqp_set_rpc_timeout(state, &value);
+}
+
+// rabbitmq-c sends with no deadline and, on a partial send, reads with none
+// either; a socket whose send buffer has no room now belongs to a peer that
+// has stopped reading.
+bool CanSendNow(amqp_connection_state_t state) {
+    pollfd entry{amqp_get_sockfd(state), POLLOUT, 0};
+    return entry.fd >= 0 && poll(&entry, 1, 0) == 1 && (entry.revents & POLLOUT) != 0 &&
+           (entry.revents & (POLLERR | POLLHUP)) == 0;
 }
 
 struct ConnectionStateDeleter {
@@ -147,6 +169,10 @@ void AmqpConnection::Connect() {
     CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
                           User.c_str(), Password.c_str()),
                ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
+    // Without it an RPC waits for its answer as long as heartbeats allow, or
+    // for ever when they are off; the reconnect thread's own RPCs (the
+    // channels opened again below) have nobody else to watch them.
+    SetRpcTimeout(state.get(), std::chrono::duration_cast<milliseconds>(StallLimit() / 2));
 
     // Nobody else can be using the replaced state: every call takes the gate.
     if (Connection != nullptr) amqp_destroy_connection(Connection);
@@ -275,6 +301,7 @@ void AmqpConnection::CloseChannel(uint16_t channelId) {
     if (Channels.erase(channelId) == 0 || Connection == nullptr) return;
     // The number goes back to CreateChannel, and opening a channel that is
     // still open would make the broker close the whole connection.
+    SocketWatchdog::Scope watch(Watchdog, Connection);
     const amqp_rpc_reply_t reply = amqp_channel_close(Connection, channelId, AMQP_REPLY_SUCCESS);
     if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
         Log("Error closing AMQP channel " + std::to_string(channelId) + ". " +
@@ -297,6 +324,7 @@ void AmqpConnection::OpenChannel(uint16_t channelId) {
     const std::string context = "Error opening AMQP channel. ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kOpeningChannel, context);
+    SocketWatchdog::Scope watch(Watchdog, Connection);
     amqp_channel_open(Connection, channelId);
     CheckReply(LastReply(), ErrorCodes::kOpeningChannel, context);
 }
@@ -307,6 +335,7 @@ void AmqpConnection::DeclareExchange(uint16_t channelId) {
         ". Exchange name: \"" + ExchangeName + "\". ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kDeclaringExchange, context);
+    SocketWatchdog::Scope watch(Watchdog, Connection);
     amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
                           amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
     CheckReply(LastReply(), ErrorCodes::kDeclaringExchange, context);
@@ -321,6 +350,7 @@ void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t 
         ". Global: " + (global ? "true" : "false") + ". ";
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kSettingQoS, context);
+    SocketWatchdog::Scope watch(Watchdog, Connection);
     amqp_basic_qos(Connection, channelId, prefetchSize, prefetchCount, global ? 1 : 0);
     CheckReply(LastReply(), ErrorCodes::kSettingQoS, context);
 }
@@ -328,7 +358,16 @@ void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t 
 void AmqpConnection::CloseConnection() {
     ControlGateGuard gate(Gate);
     if (Connection == nullptr) return;
-    const amqp_rpc_reply_t reply = amqp_connection_close(Connection, AMQP_REPLY_SUCCESS);
+    // Called from the destructor too, when no thread keeps the watchdog: the
+    // close is polite only while the broker reads and answers promptly.
+    amqp_rpc_reply_t reply = AmqpNoReply();
+    if (CanSendNow(Connection)) {
+        SetRpcTimeout(Connection,
+                      std::min(kLongestCloseWait,
+                               std::chrono::duration_cast<milliseconds>(StallLimit() / 2)));
+        SocketWatchdog::Scope watch(Watchdog, Connection);
+        reply = amqp_connection_close(Connection, AMQP_REPLY_SUCCESS);
+    }
     // The state goes whatever the broker said, so that nothing is left open.
     const int status = amqp_destroy_connection(Connection);
     Connection = nullptr;
@@ -339,6 +378,12 @@ void AmqpConnection::CloseConnection() {
                             "Error ending connection.  AMQP status: " + std::to_string(status),
                             status);
     }
+}
+
+std::chrono::steady_clock::duration AmqpConnection::StallLimit() const {
+    const int32_t seconds = HeartbeatSeconds > 0 ? std::max(HeartbeatSeconds, kShortestStallSeconds)
+                                                 : kStallSecondsWithoutHeartbeat;
+    return std::chrono::seconds(seconds);
 }
 
 std::string AmqpConnection::ReplyText(const amqp_rpc_reply_t& reply) {

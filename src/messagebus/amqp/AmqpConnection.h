@@ -15,6 +15,7 @@
 #include "errors/AmqpException.h"
 #include "messagebus/amqp/AmqpChannel.h"
 #include "messagebus/amqp/AmqpGate.h"
+#include "messagebus/amqp/SocketWatchdog.h"
 #include "messagebus/concurrency/Semaphore.h"
 #include "messagebus/amqp/SslInitLibrary.h"
 
@@ -57,7 +58,9 @@ public:
     // The topic exchange ExchangeName: durable, not auto-deleted, not internal.
     void DeclareExchange(uint16_t channelId);
     void SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t prefetchCount, bool global);
-    // Closes with 200 and destroys the connection state.
+    // Closes with 200 and destroys the connection state. The close handshake
+    // is skipped when the socket cannot take the close at once, and the
+    // broker's answer is awaited for a few seconds at most.
     void CloseConnection();
 
     // The text form of a reply, as it appears in the failure texts.
@@ -89,6 +92,13 @@ protected:
     void Log(const std::string& line) const;
     // Hands an error that has no caller to the manager's last error.
     void ReportError(const VeldraException& error) const;
+
+    // How long one socket call may run before the watchdog shuts its socket
+    // down: one heartbeat interval, after which the broker itself gives a
+    // silent peer up. A method call that waits for the broker's answer (an
+    // RPC) gives up after half of it, so that it ends, and rabbitmq-c closes
+    // the socket, before the watchdog would cut it.
+    std::chrono::steady_clock::duration StallLimit() const;
 
     // Throws AmqpException(code, context + ReplyText(reply), library_error)
     // unless the reply is normal.
@@ -126,6 +136,9 @@ protected:
     Semaphore WakeSignal;
     // GateMutex, GateWaiters and GateIdle.
     mutable AmqpGate Gate;
+    // Every call on the socket runs inside one of its scopes; the reconnect
+    // thread of a polling connection keeps it.
+    SocketWatchdog Watchdog;
 
 private:
     // Opens the socket within the time-out rules; returns the last status.

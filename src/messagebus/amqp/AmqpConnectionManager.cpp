@@ -10,7 +10,8 @@
 namespace Korvane::Veldra::MessageBus {
 namespace {
 
-// The number of a channel handed in by a caller; a null channel is refused.
+// The number of a channel handed in by a caller; a null channel is refused,
+// before any connection is made for it.
 uint16_t IdOf(const std::shared_ptr<AmqpChannel>& channel) {
     if (!channel) throw VeldraException(ErrorCodes::kException, "No AMQP channel given.");
     return channel->Id;
@@ -84,13 +85,30 @@ int32_t AmqpConnectionManager::GetConnectTimeout() const {
 
 template <typename Connection>
 std::shared_ptr<Connection> AmqpConnectionManager::GetOrMake(std::shared_ptr<Connection>& field) {
-    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
-    if (!field) {
-        field = std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
-                                             TlsServerName, CertPath, ConnectTimeoutMs,
-                                             HeartbeatSeconds);
+    int32_t connectTimeoutMs = 0;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        if (field) return field;
+        connectTimeoutMs = ConnectTimeoutMs;
     }
-    return field;
+    // The connect runs without the class-wide mutex: a broker that takes its
+    // whole time-out to answer must not hold up the other managers of the
+    // process, their reconnect threads included. The other settings are
+    // fixed at construction.
+    auto made =
+        std::make_shared<Connection>(this, User, Password, Host, Port, ExchangeName, UseTls,
+                                     TlsServerName, CertPath, connectTimeoutMs, HeartbeatSeconds);
+    std::shared_ptr<Connection> kept;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+        if (!field) field = made;
+        kept = field;
+    }
+    // A caller that connected at the same time won: this connection is
+    // released here, without the mutex, since its threads take the mutex to
+    // report until they are joined.
+    made.reset();
+    return kept;
 }
 
 std::shared_ptr<AmqpPublisherConnection> AmqpConnectionManager::GetPublisherConnection() {
@@ -112,18 +130,21 @@ std::shared_ptr<AmqpChannel> AmqpConnectionManager::CreateConsumerChannel() {
 void AmqpConnectionManager::Publish(const std::shared_ptr<AmqpChannel>& channel,
                                     const MessageHeaders& envelope, const MessageBody& body,
                                     bool mandatory) {
-    GetPublisherConnection()->Publish(IdOf(channel), envelope, body, mandatory);
+    const uint16_t id = IdOf(channel);
+    GetPublisherConnection()->Publish(id, envelope, body, mandatory);
 }
 
 void AmqpConnectionManager::DeclareQueue(const std::shared_ptr<AmqpChannel>& channel,
                                          const std::string& queueName, bool durable, bool exclusive,
                                          bool autoDelete) {
-    GetConsumerConnection()->DeclareQueue(IdOf(channel), queueName, durable, exclusive, autoDelete);
+    const uint16_t id = IdOf(channel);
+    GetConsumerConnection()->DeclareQueue(id, queueName, durable, exclusive, autoDelete);
 }
 
 void AmqpConnectionManager::SetQos(const std::shared_ptr<AmqpChannel>& channel,
                                    uint32_t prefetchSize, uint16_t prefetchCount, bool global) {
-    GetConsumerConnection()->SetQos(IdOf(channel), prefetchSize, prefetchCount, global);
+    const uint16_t id = IdOf(channel);
+    GetConsumerConnection()->SetQos(id, prefetchSize, prefetchCount, global);
 }
 
 void AmqpConnectionManager::AddBinding(const std::shared_ptr<AmqpChannel>& channel,
@@ -153,12 +174,14 @@ void AmqpConnectionManager::RebindAll(const std::shared_ptr<AmqpChannel>& channe
 }
 
 void AmqpConnectionManager::Ack(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag) {
-    GetConsumerConnection()->Ack(IdOf(channel), deliveryTag);
+    const uint16_t id = IdOf(channel);
+    GetConsumerConnection()->Ack(id, deliveryTag);
 }
 
 void AmqpConnectionManager::Requeue(const std::shared_ptr<AmqpChannel>& channel,
                                     uint64_t deliveryTag) {
-    GetConsumerConnection()->Requeue(IdOf(channel), deliveryTag);
+    const uint16_t id = IdOf(channel);
+    GetConsumerConnection()->Requeue(id, deliveryTag);
 }
 
 void AmqpConnectionManager::Start() {

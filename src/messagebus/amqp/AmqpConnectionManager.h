@@ -47,8 +47,10 @@ public:
     // For connections made after the call.
     void SetConnectTimeout(int32_t timeoutMs);
 
-    // The connection, made (and connected) on first use under the class-wide
-    // mutex. A failed construction leaves none, so the next use tries again.
+    // The connection, made (and connected) on first use, outside the
+    // class-wide mutex; when two callers make it at once, the first one kept
+    // is handed to both and the other is closed. A failed construction leaves
+    // none, so the next use tries again.
     std::shared_ptr<AmqpPublisherConnection> GetPublisherConnection();
     std::shared_ptr<AmqpConsumerConnection> GetConsumerConnection();
     std::shared_ptr<AmqpChannel> CreatePublisherChannel();

@@ -11,9 +11,6 @@ namespace {
 
 // The reconnect thread looks at the watchdog this often.
 constexpr uint32_t kWatchPeriodMs = 1000;
-// The stall limit when heartbeats are off, and the least one.
-constexpr int32_t kStallSecondsWithoutHeartbeat = 270;
-constexpr int32_t kShortestStallSeconds = 5;
 
 void Drain(Semaphore& semaphore) {
     while (semaphore.Acquire(0)) {
@@ -133,12 +130,6 @@ void AmqpPollingConnection::LibraryFailure(int status) {
 void AmqpPollingConnection::Disconnect() {
     Disconnected = true;
     ReconnectSignal.Release();
-}
-
-AmqpPollingConnection::Clock::duration AmqpPollingConnection::StallLimit() const {
-    const int32_t seconds = HeartbeatSeconds > 0 ? std::max(HeartbeatSeconds, kShortestStallSeconds)
-                                                 : kStallSecondsWithoutHeartbeat;
-    return std::chrono::seconds(seconds);
 }
 
 void AmqpPollingConnection::StartReader() {

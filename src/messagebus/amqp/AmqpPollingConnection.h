@@ -9,15 +9,14 @@
 
 #include "messagebus/amqp/AmqpConnection.h"
 #include "messagebus/concurrency/ResetEvent.h"
-#include "messagebus/amqp/SocketWatchdog.h"
 
 namespace Korvane::Veldra::MessageBus {
 
 // What the publisher and the consumer connection share: a reader thread that
 // polls the socket and sorts what arrives, and a reconnect thread that waits
 // for the reader's signal and connects anew. The reconnect thread also keeps
-// the socket watchdog: a socket call that runs longer than StallLimit() has
-// its socket shut down.
+// the socket watchdog of the base: a socket call that runs longer than
+// StallLimit() has its socket shut down.
 class AmqpPollingConnection : public AmqpConnection {
 public:
     using Clock = std::chrono::steady_clock;
@@ -69,12 +68,6 @@ protected:
     // The broker closed the channel; called by the reader with the gate held.
     // Logs and posts the channel's reset.
     virtual void OnChannelClosed(amqp_channel_t channel);
-    // How long one socket call may run before its socket is shut down: one
-    // heartbeat interval, after which the broker itself gives a silent peer
-    // up.
-    Clock::duration StallLimit() const;
-
-    SocketWatchdog Watchdog;
 
 private:
     PollOutcome PollUnderGate(const timeval& timeout);

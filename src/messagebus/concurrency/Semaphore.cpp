@@ -93,9 +93,11 @@ bool Semaphore::Acquire(uint32_t timeoutMs) {
     if (timeoutMs == 0) {
         failure = WaitRetryingInterrupts([this] { return sem_trywait(&semaphore_); });
     } else if (timeoutMs == kInfinite) {
+        const WaiterMark waiting(waiters_);
         failure = WaitRetryingInterrupts([this] { return sem_wait(&semaphore_); });
     } else {
         const timespec deadline = DeadlineAfter(timeoutMs);
+        const WaiterMark waiting(waiters_);
         failure = WaitRetryingInterrupts([&] { return sem_timedwait(&semaphore_, &deadline); });
     }
     if (failure == 0) return true;
@@ -104,6 +106,7 @@ bool Semaphore::Acquire(uint32_t timeoutMs) {
 }
 
 void Semaphore::Wait() {
+    const WaiterMark waiting(waiters_);
     if (WaitRetryingInterrupts([this] { return sem_wait(&semaphore_); }) != 0) {
         throw VeldraException(ErrorCodes::kException, "Acquire -- unexpected failure.");
     }

@@ -2,6 +2,7 @@
 
 #include <semaphore.h>
 
+#include <atomic>
 #include <cstdint>
 
 #include "errors/VeldraException.h"
@@ -30,9 +31,25 @@ public:
     // "Acquire -- unexpected failure." on any other error.
     void Wait();
     void Release();
+    // The threads inside a waiting Acquire or Wait: counted just before they
+    // wait, so a thread counted here is blocked or about to be.
+    int32_t Waiters() const { return waiters_.load(); }
 
 private:
+    // Counts the calling thread as a waiter for its lifetime.
+    class WaiterMark {
+    public:
+        explicit WaiterMark(std::atomic<int32_t>& waiters) : waiters_(waiters) { ++waiters_; }
+        ~WaiterMark() { --waiters_; }
+        WaiterMark(const WaiterMark&) = delete;
+        WaiterMark& operator=(const WaiterMark&) = delete;
+
+    private:
+        std::atomic<int32_t>& waiters_;
+    };
+
     sem_t semaphore_;
+    std::atomic<int32_t> waiters_{0};
 };
 
 // The exceptions for a failed sem_init and a failed wait, by errno.

@@ -76,6 +76,9 @@ public:
         Available.Release();
     }
 
+    // The threads waiting in TryTake (see Semaphore::Waiters).
+    int32_t Takers() const { return Available.Waiters(); }
+
 private:
     std::mutex Mutex;
     Semaphore Available;

@@ -10,14 +10,29 @@
 namespace Korvane::Veldra::Testing {
 
 TagServiceProcess* ClientBrokerTest::service = nullptr;
+bool ClientBrokerTest::startAttempted = false;
 
-void ClientBrokerTest::SetUpTestSuite() {
+void ClientBrokerTest::SetUp() {
+    // One attempt only: a service that did not start once fails every test
+    // at once instead of making each wait for it again.
+    if (!startAttempted) {
+        startAttempted = true;
+        StartSuite();
+    }
+    ASSERT_NE(service, nullptr) << "the tag service did not start (see the first test)";
+}
+
+void ClientBrokerTest::StartSuite() {
     // Both configurations are on disk before anything reads the data root.
     const std::string& root = UseBrokerDataRoot();
     BrokerSettings unreachable = Broker();
     unreachable.AmqpPort = 1;  // privileged and unused: the connect is refused
     WriteBrokerDataRoot(unreachable, root, kUnreachableId);
-    service = new TagServiceProcess();
+    try {
+        service = new TagServiceProcess();
+    } catch (const std::exception& error) {
+        ADD_FAILURE() << error.what();
+    }
 }
 
 void ClientBrokerTest::TearDownTestSuite() {

@@ -26,7 +26,10 @@ inline const char* const kUnreachableId = "veldra_unreachable";
 // Each test works under paths of its own.
 class ClientBrokerTest : public ::testing::Test {
 protected:
-    static void SetUpTestSuite();
+    // The data root and the service are made by the first test, not in
+    // SetUpTestSuite: a failure there would show every test as skipped, and
+    // ctest would pass the run. Here each test fails while they are not up.
+    void SetUp() override;
     static void TearDownTestSuite();
     void TearDown() override;
 
@@ -42,6 +45,10 @@ protected:
                  std::shared_ptr<TagData>& tag, std::string& error, bool* created = nullptr);
 
     static TagServiceProcess* service;
+
+private:
+    static void StartSuite();
+    static bool startAttempted;
 };
 
 // Holds the tag service still (SIGSTOP) until Resume or the end of its life.

@@ -7,6 +7,8 @@
 
 #include "BusTestSupport.h"
 #include "messagebus/amqp/AmqpFrames.h"
+#include "support/BrokerEnvironment.h"
+#include "support/RawAmqpConnection.h"
 
 namespace Korvane::Veldra::Testing {
 namespace {
@@ -107,9 +109,26 @@ TEST_F(PublishConsume, MandatoryPublishWithoutQueueComesBackAsNotice) {
 }
 
 TEST_F(PublishConsume, FailingHandlerKeepsTheConsumerGoing) {
+    // The queue loses its binding behind the consumer's back, and the failing
+    // message comes straight to the queue: a probe through the exchange can
+    // arrive only once the consumer has bound the queue again.
+    RawAmqpConnection raw;
+    ASSERT_EQ(raw.OpenTcp(Broker().Host, Broker().AmqpPort), AMQP_STATUS_OK);
+    ASSERT_TRUE(raw.Login(Broker().User, Broker().Password));
+    ASSERT_TRUE(raw.OpenChannel(1));
+    amqp_queue_unbind(raw.Get(), 1, amqp_cstring_bytes(queue.c_str()),
+                      amqp_cstring_bytes(manager->GetExchangeName().c_str()),
+                      amqp_cstring_bytes(("Veldra." + queue + ".#").c_str()), amqp_empty_table);
+    ASSERT_TRUE(IsNormal(amqp_get_rpc_reply(raw.Get())));
     consumer->callback->ThrowFor("corr-boom");
-    manager->Publish(channel, HeadersTo(queue, "SomeRoutedMessage", "corr-boom"), MessageBody(),
-                     false);
+    amqp_basic_properties_t properties{};
+    properties._flags = AMQP_BASIC_TYPE_FLAG | AMQP_BASIC_CORRELATION_ID_FLAG;
+    properties.type = amqp_cstring_bytes("SomeRoutedMessage");
+    properties.correlation_id = amqp_cstring_bytes("corr-boom");
+    ASSERT_EQ(amqp_basic_publish(raw.Get(), 1, amqp_empty_bytes,
+                                 amqp_cstring_bytes(queue.c_str()), 0, 0, &properties,
+                                 amqp_cstring_bytes("{}")),
+              AMQP_STATUS_OK);
     ASSERT_NE(consumer->callback->WaitForMessage("corr-boom", kArrival), nullptr);
 
     // The thread lives on, and the queue is declared and bound again.

@@ -26,17 +26,30 @@ namespace Ingest = Tags::TagIngestionMessages;
 // One service for the whole suite; each test works under its own paths.
 class TagServiceWiringTest : public ::testing::Test {
 protected:
-    static void SetUpTestSuite() {
-        TagServiceProcess::Options options;
-        options.verbose = true;
-        service = new TagServiceProcess(options);
+    // The service is started by the first test, not in SetUpTestSuite: a
+    // failure there would show every test as skipped, and ctest would pass
+    // the run. Here each test fails while it is not up; it is tried once.
+    void SetUp() override {
+        if (!startAttempted) {
+            startAttempted = true;
+            TagServiceProcess::Options options;
+            options.verbose = true;
+            try {
+                service = new TagServiceProcess(options);
+            } catch (const std::exception& error) {
+                ADD_FAILURE() << error.what();
+            }
+        }
+        ASSERT_NE(service, nullptr) << "the tag service did not start (see the first test)";
     }
     static void TearDownTestSuite() {
         delete service;
         service = nullptr;
     }
     void TearDown() override {
-        if (HasFailure()) std::cerr << "service output:\n" << service->Output();
+        if (HasFailure() && service != nullptr) {
+            std::cerr << "service output:\n" << service->Output();
+        }
     }
 
     // A raw message of the type to a target, with the body as it stands.
@@ -51,9 +64,11 @@ protected:
     }
 
     static TagServiceProcess* service;
+    static bool startAttempted;
     TagServiceClient client;
 };
 TagServiceProcess* TagServiceWiringTest::service = nullptr;
+bool TagServiceWiringTest::startAttempted = false;
 
 TEST_F(TagServiceWiringTest, CreateAnswersWithGenericResponseAndRefusesBadPathsInTheHeaders) {
     client.Listen(Info::TagInfoTagMetadataUpdatedBroadcast::kMessageName);

@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <string>
 
 #include "errors/AmqpException.h"
@@ -22,9 +23,26 @@ TEST(AmqpConnectionManager, LastErrorKeepsTextAndCodeUntilReplaced) {
     manager.SetLastError(VeldraException(ErrorCodes::kException, "later"));
     ASSERT_TRUE(manager.GetLastError(error));
     EXPECT_EQ(std::string(error.what()), "later");
-    AmqpConnectionManager::ReleaseInstance();  // none made: nothing happens
-    // A null channel is refused before any connection is made.
-    EXPECT_THROW(manager.AddBinding(nullptr, "queue", {"key"}, true), VeldraException);
+}
+
+TEST(AmqpConnectionManager, NullChannelIsRefusedBeforeAnyConnectionIsTried) {
+    // An empty host would fail too, but only after a connect attempt, which
+    // logs its first line.
+    AmqpConnectionManager manager{VeldraConfiguration{}};
+    manager.SetConnectTimeout(0);
+    for (const auto& call :
+         {std::function<void()>([&] { manager.AddBinding(nullptr, "q", {"k"}, true); }),
+          std::function<void()>([&] { manager.SetQos(nullptr, 0, 1, false); })}) {
+        try {
+            call();
+            ADD_FAILURE() << "a null channel was taken";
+        } catch (const VeldraException& error) {
+            EXPECT_EQ(error.Code(), ErrorCodes::kException);
+            EXPECT_EQ(std::string(error.what()), "No AMQP channel given.");
+        }
+    }
+    std::string line;
+    EXPECT_FALSE(manager.TakeLog(line, 0)) << line;
 }
 
 }  // namespace

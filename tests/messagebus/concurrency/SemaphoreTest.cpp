@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <cerrno>
 #include <chrono>
 #include <string>
@@ -7,6 +8,7 @@
 
 #include "errors/ErrorCodes.h"
 #include "messagebus/concurrency/Semaphore.h"
+#include "support/SpinUntil.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -37,21 +39,29 @@ TEST(Semaphore, TimedAcquireAcrossSecondBoundaryIsAValidDeadline) {
 }
 
 TEST(Semaphore, WaitersAreWokenByReleaseFromAnotherThread) {
+    using ::Korvane::Veldra::Testing::SpinUntil;
     Semaphore semaphore;
-    bool infiniteAcquired = false;
-    bool timedAcquired = false;
-    std::thread infinite([&] { infiniteAcquired = semaphore.Acquire(Semaphore::kInfinite); });
-    std::thread timed([&] { timedAcquired = semaphore.Acquire(600000); });
-    std::thread plain([&] { semaphore.Wait(); });
-    semaphore.Release();
-    semaphore.Release();
-    semaphore.Release();
+    std::atomic<int> acquired{0};
+    std::thread infinite([&] { acquired += semaphore.Acquire(Semaphore::kInfinite); });
+    std::thread timed([&] { acquired += semaphore.Acquire(600000); });
+    std::thread plain([&] {
+        semaphore.Wait();
+        ++acquired;
+    });
+    // All three wait before the first release, so each count wakes one.
+    EXPECT_TRUE(SpinUntil([&] { return semaphore.Waiters() == 3; }));
+    for (int i = 0; i < 3; ++i) semaphore.Release();
+    const bool woken = SpinUntil([&] { return acquired == 3; });
+    EXPECT_TRUE(woken) << acquired << " of 3 woken";
+    // Ends a waiter that stayed blocked, so that the joins return.
+    for (int i = 0; !woken && i < 3; ++i) semaphore.Release();
     infinite.join();
     timed.join();
     plain.join();
-    EXPECT_TRUE(infiniteAcquired);
-    EXPECT_TRUE(timedAcquired);
-    EXPECT_FALSE(semaphore.Acquire(0));
+    EXPECT_EQ(semaphore.Waiters(), 0);
+    if (woken) {
+        EXPECT_FALSE(semaphore.Acquire(0));
+    }
 }
 
 struct ErrnoCase {

@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <memory>
 #include <optional>
 #include <string>
@@ -9,10 +10,12 @@
 #include "errors/ErrorCodes.h"
 #include "support/CatchVeldra.h"
 #include "messagebus/concurrency/SharedQueue.h"
+#include "support/SpinUntil.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
 
+using ::Korvane::Veldra::Testing::SpinUntil;
 using Testing::CatchVeldra;
 
 TEST(SharedQueue, ItemsLeaveInArrivalOrderAndAnEmptyQueueGivesNothing) {
@@ -83,13 +86,22 @@ TEST(SharedQueue, ClosedQueueDrainsThenEndsEveryTake) {
 }
 
 TEST(SharedQueue, BlockedTakersWakeOnErrorAndOnClose) {
+    // Each taker is blocked before the error or the close arrives. A taker
+    // that is not woken is ended by the close, so the joins always return.
     SharedQueue<int> queue;
     std::optional<VeldraException> errorSeen;
+    std::atomic<int> ended{0};
     std::thread errorTaker([&] {
         int out = 0;
         errorSeen = CatchVeldra([&] { queue.TryTake(out, Semaphore::kInfinite); });
+        ++ended;
     });
+    EXPECT_TRUE(SpinUntil([&] { return queue.Takers() == 1; }));
     queue.SetError("gone");
+    if (!SpinUntil([&] { return ended == 1; })) {
+        ADD_FAILURE() << "the error did not wake the taker";
+        queue.Close();
+    }
     errorTaker.join();
     ASSERT_TRUE(errorSeen.has_value());
     EXPECT_EQ(errorSeen->Code(), ErrorCodes::kQueueEmpty);
@@ -103,6 +115,7 @@ TEST(SharedQueue, BlockedTakersWakeOnErrorAndOnClose) {
             seen = CatchVeldra([&] { queue.TryTake(out, 600000); });
         });
     }
+    EXPECT_TRUE(SpinUntil([&] { return queue.Takers() == 3; }));
     queue.Close();
     for (auto& taker : takers) taker.join();
     for (const auto& seen : closeSeen) {
