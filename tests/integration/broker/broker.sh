@@ -5,6 +5,8 @@
 #   broker.sh stop  ENV_FILE   stop the node ENV_FILE describes, remove its files
 #   broker.sh env   ENV_FILE   print ENV_FILE if its node is still running
 #   broker.sh ctl   ENV_FILE ARGS...   run rabbitmqctl ARGS on that node
+#   broker.sh kill  ENV_FILE   SIGKILL the node, keeping its files and ports
+#   broker.sh restart ENV_FILE start a killed node again on the same files and ports
 #
 # The node never touches a system-wide broker: it has its own directory under
 # $TMPDIR (owned by the "rabbitmq" user when started as root), its own node
@@ -220,15 +222,7 @@ EOF
     make_launchers "$dir" "$user" "$group"
     chown -R "$user:$group" "$dir"
 
-    # Both run in sessions of their own, detached from our output, so that a
-    # caller reading our output (ctest) is not kept waiting by them.
-    setsid "$dir/bin/run" epmd -port "$epmd_port" -address 127.0.0.1 \
-        </dev/null >"$dir/log/epmd.log" 2>&1 9>&- &
-    setsid "$dir/bin/run" "$RABBITMQ_BIN/rabbitmq-server" \
-        </dev/null >"$dir/log/startup.log" 2>&1 9>&- &
-    local server=$!
-
-    wait_for_node "$dir" "$server"
+    launch_node "$dir" "$epmd_port"
     exec 9>&-
 
     local tmp="$envfile.tmp.$$"
@@ -256,6 +250,19 @@ EOF
     trap - EXIT HUP INT TERM
     log "node $node up in $((SECONDS - started))s: amqp 127.0.0.1:$amqp," \
         "amqps 127.0.0.1:$amqps, settings in $envfile"
+}
+
+# Starts epmd and the node from DIR and waits for the node to run. Both run
+# in sessions of their own, detached from our output, so that a caller
+# reading our output (ctest) is not kept waiting by them.
+launch_node() {
+    local dir=$1 epmd_port=$2 server
+    setsid "$dir/bin/run" epmd -port "$epmd_port" -address 127.0.0.1 \
+        </dev/null >>"$dir/log/epmd.log" 2>&1 9>&- &
+    setsid "$dir/bin/run" "$RABBITMQ_BIN/rabbitmq-server" \
+        </dev/null >>"$dir/log/startup.log" 2>&1 9>&- &
+    server=$!
+    wait_for_node "$dir" "$server"
 }
 
 # bin/run starts a program as the node's user with nothing but the node's
@@ -360,8 +367,39 @@ cmd_ctl() {
     exec "$(read_env_value "$envfile" BROKER_CTL)" "$@"
 }
 
+# The directory of the running test node that ENV_FILE describes.
+node_dir_of() {
+    local envfile=$1 dir
+    [ -f "$envfile" ] || die "no $envfile: the node is not running"
+    dir=$(read_env_value "$envfile" BROKER_DIR)
+    case "$dir" in
+    */kvveldra-broker.??????) ;;
+    *) die "$envfile does not describe a test node (BROKER_DIR='$dir')" ;;
+    esac
+    echo "$dir"
+}
+
+# Kills every process of the node at once (SIGKILL), as a crash would; its
+# directory, data and settings stay for "restart".
+cmd_kill() {
+    local dir
+    dir=$(node_dir_of "$1")
+    kill_node_pids "$dir" KILL 10 || die "some processes of $dir would not die"
+    log "killed the node of $dir"
+}
+
+# Starts the node of ENV_FILE again on its ports and data, after "kill".
+cmd_restart() {
+    local envfile=$1 dir started=$SECONDS
+    dir=$(node_dir_of "$envfile")
+    [ -z "$(node_pids "$dir")" ] || die "the node of $dir still runs; kill it first"
+    rm -f -- "$dir/node.pid"
+    launch_node "$dir" "$(read_env_value "$envfile" BROKER_EPMD_PORT)"
+    log "restarted the node of $dir in $((SECONDS - started))s"
+}
+
 main() {
-    [ $# -ge 2 ] || die "usage: $0 start|stop|env|ctl ENV_FILE [ARGS...]"
+    [ $# -ge 2 ] || die "usage: $0 start|stop|env|ctl|kill|restart ENV_FILE [ARGS...]"
     local command=$1 envfile=$2
     shift 2
     case "$command" in
@@ -369,6 +407,8 @@ main() {
     stop) cmd_stop "$envfile" ;;
     env) cmd_env "$envfile" ;;
     ctl) cmd_ctl "$envfile" "$@" ;;
+    kill) cmd_kill "$envfile" ;;
+    restart) cmd_restart "$envfile" ;;
     *) die "unknown command '$command'" ;;
     esac
 }
