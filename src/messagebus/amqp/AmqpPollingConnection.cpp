@@ -11,6 +11,8 @@ namespace {
 
 // The reconnect thread looks at the watchdog this often.
 constexpr uint32_t kWatchPeriodMs = 1000;
+// The pause between two failed attempts to connect again.
+constexpr uint32_t kReconnectRetryMs = 500;
 
 void Drain(Semaphore& semaphore) {
     while (semaphore.Acquire(0)) {
@@ -172,7 +174,16 @@ void AmqpPollingConnection::ReconnectLoop() {
             }
             if (StopRequested) return;
             Log(texts_.reconnecting);
-            Reconnect();
+            // A failed attempt is tried again after a pause, for as long as
+            // the connection is meant to run: a broker that is down when the
+            // first attempt comes (a node restart, an application stop) must
+            // not leave the connection broken for good. The pause ends early
+            // on a stop or a new request to reconnect.
+            while (!Reconnect() && !StopRequested) {
+                ReconnectSignal.Acquire(kReconnectRetryMs);
+                if (StopRequested) return;
+                Log(texts_.reconnecting);
+            }
         }
     } catch (const std::exception& error) {
         // The wait itself failed: nothing here can go on.
@@ -180,7 +191,7 @@ void AmqpPollingConnection::ReconnectLoop() {
     }
 }
 
-void AmqpPollingConnection::Reconnect() {
+bool AmqpPollingConnection::Reconnect() {
     try {
         Disconnected = true;
         WakeSignal.Release();
@@ -189,11 +200,13 @@ void AmqpPollingConnection::Reconnect() {
         Connect();
         OnReconnected();
         StartReader();
+        return true;
     } catch (const VeldraException& error) {
         if (!StopRequested) ReportError(error);
     } catch (const std::exception& error) {
         if (!StopRequested) ReportError(VeldraException(ErrorCodes::kException, error.what()));
     }
+    return false;
 }
 
 }  // namespace Korvane::Veldra::MessageBus

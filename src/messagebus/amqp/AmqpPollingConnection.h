@@ -72,7 +72,8 @@ protected:
 private:
     PollOutcome PollUnderGate(const timeval& timeout);
     void StartReader();
-    void Reconnect();
+    // One attempt to connect again; false when it failed and was reported.
+    bool Reconnect();
     void Deliver(const EnvelopePtr& envelope);
     void HandleMethod(amqp_method_number_t method, amqp_channel_t channel);
     void LibraryFailure(int status);

@@ -37,7 +37,7 @@ Counts Take() {
 // Disabled while a failed reconnect is never tried again: a reset in the
 // middle of a reconnect's handshake leaves every publish failing with -251032.
 // Run with --gtest_also_run_disabled_tests.
-TEST_F(FaultBrokerTest, DISABLED_AHundredResetsLeaveNoThreadOrDescriptorBehind) {
+TEST_F(FaultBrokerTest, AHundredResetsLeaveNoThreadOrDescriptorBehind) {
     const uint32_t reference = Open(UniquePath("cycles"));
     ASSERT_NE(reference, 0u);
     ASSERT_EQ(Write(reference, "1.5").status, 0);

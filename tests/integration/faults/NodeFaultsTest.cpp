@@ -18,7 +18,7 @@ TEST_F(FaultBrokerTest, ClosedConnectionsAreOvercome) {
 // Disabled while a failed reconnect is never tried again: once the node was
 // away for one attempt, every publish fails with -251032 until the instance
 // is closed. Run with --gtest_also_run_disabled_tests.
-TEST_F(FaultBrokerTest, DISABLED_AStoppedApplicationFailsCallsUntilItIsBack) {
+TEST_F(FaultBrokerTest, AStoppedApplicationFailsCallsUntilItIsBack) {
     const uint32_t reference = Open(UniquePath("stopped"));
     ASSERT_NE(reference, 0u);
     ASSERT_TRUE(StopApp());
@@ -31,7 +31,7 @@ TEST_F(FaultBrokerTest, DISABLED_AStoppedApplicationFailsCallsUntilItIsBack) {
 // Disabled while a failed reconnect is never tried again: once the node was
 // away for one attempt, every publish fails with -251032 until the instance
 // is closed. Run with --gtest_also_run_disabled_tests.
-TEST_F(FaultBrokerTest, DISABLED_AKilledNodeFailsCallsUntilItIsRestarted) {
+TEST_F(FaultBrokerTest, AKilledNodeFailsCallsUntilItIsRestarted) {
     const uint32_t reference = Open(UniquePath("killed"));
     ASSERT_NE(reference, 0u);
     ASSERT_TRUE(KillNode());
