@@ -4,6 +4,8 @@
 #include <stdexcept>
 #include <unordered_set>
 
+#include "utilities/NoDestructor.h"
+
 namespace Korvane::Veldra::TagLibrary {
 namespace {
 
@@ -16,8 +18,8 @@ struct ReferencePool {
 };
 
 ReferencePool& Pool() {
-    static ReferencePool* pool = new ReferencePool();  // outlives every TagData
-    return *pool;
+    static VeldraUtilities::NoDestructor<ReferencePool> pool;  // outlives every TagData
+    return pool.Get();
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 #include "errors/ErrorCodes.h"
 #include "errors/VeldraException.h"
 #include "messagelibrary/json/JsonParser.h"
+#include "utilities/NoDestructor.h"
 #include "utilities/Paths.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -45,8 +46,8 @@ struct ProcessStore {
 };
 
 ProcessStore& Store() {
-    static ProcessStore* store = new ProcessStore();  // outlives static destruction
-    return *store;
+    static VeldraUtilities::NoDestructor<ProcessStore> store;  // outlives static destruction
+    return store.Get();
 }
 
 std::filesystem::path ProcessDirectory() {
