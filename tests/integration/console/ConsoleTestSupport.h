@@ -8,17 +8,11 @@
 #include <vector>
 
 #include "kvveldra/TagConsole.h"
+#include "support/ExportedNumbers.h"
 #include "support/SuiteTagService.h"
 
 namespace Korvane::Veldra::Testing {
 
-// Exported data types.
-enum ConsoleType : int32_t { kDouble = 0, kInt = 1, kString = 2, kBoolean = 3, kUInt64 = 4, kDateTime = 5 };
-
-inline constexpr int32_t kInvalidTagReference = -251900;
-inline constexpr int32_t kRequestTimedOut = -251001;
-inline constexpr int32_t kNoSuchTag = -251909;
-inline constexpr int32_t kStringTagCannotCollectAggregates = -251908;
 
 // The console family on the default instance, against one reference tag
 // service for the suite whose tags live in a store file, so that the service

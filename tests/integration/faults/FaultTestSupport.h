@@ -9,6 +9,7 @@
 #include <string>
 
 #include "kvveldra/TagConsole.h"
+#include "support/ExportedNumbers.h"
 #include "support/FaultProxy.h"
 
 namespace Korvane::Veldra::Testing {
@@ -18,8 +19,6 @@ using Millis = std::chrono::milliseconds;
 // The service's request time-out, and what a call may take beyond it.
 inline constexpr Millis kRequestTimeout{10000};
 inline constexpr Millis kCallMargin{2000};
-inline constexpr int32_t kRequestTimedOut = -251001;
-inline constexpr int32_t kDouble = 0;
 
 // One console call: its status, its error text and how long it took.
 struct CallResult {
@@ -65,6 +64,11 @@ protected:
     // calls until one succeeds, within `recoveryLimit`. Checks that every call
     // returns within the time-out and its margin with a bus failure, and
     // prints one line of figures named `name`.
+    // A fault of the node that lasts a whole call window: `inject` starts
+    // it on a fresh tag, then MeasureFault with writes of `value`.
+    static FaultFigures MeasureNodeFault(const std::string& name, const std::string& value,
+                                         const std::function<::testing::AssertionResult()>& inject,
+                                         const std::function<void()>& lift);
     static FaultFigures MeasureFault(const std::string& name, const std::function<CallResult()>& call,
                                      Millis window, const std::function<void()>& lift,
                                      Millis recoveryLimit = Millis(60000));

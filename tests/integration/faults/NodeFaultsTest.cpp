@@ -15,41 +15,37 @@ TEST_F(FaultBrokerTest, ClosedConnectionsAreOvercome) {
         "close_all_connections", [&] { return Write(reference, "4.5"); }, Millis(3000), [] {});
 }
 
-// Disabled while a failed reconnect is never tried again: once the node was
-// away for one attempt, every publish fails with -251032 until the instance
-// is closed. Run with --gtest_also_run_disabled_tests.
+// A stopped application refuses connections: the failed reconnect is tried
+// again until the node is back.
 TEST_F(FaultBrokerTest, AStoppedApplicationFailsCallsUntilItIsBack) {
-    const uint32_t reference = Open(UniquePath("stopped"));
-    ASSERT_NE(reference, 0u);
-    ASSERT_TRUE(StopApp());
-    const auto figures = MeasureFault(
-        "stop_app/start_app", [&] { return Write(reference, "5.5"); }, kRequestTimeout + kCallMargin,
-        [] { ASSERT_TRUE(StartApp()); });
+    const auto figures = MeasureNodeFault("stop_app/start_app", "5.5", StopApp,
+                                          [] { ASSERT_TRUE(StartApp()); });
     EXPECT_TRUE(figures.firstError);
 }
 
-// Disabled while a failed reconnect is never tried again: once the node was
-// away for one attempt, every publish fails with -251032 until the instance
-// is closed. Run with --gtest_also_run_disabled_tests.
 TEST_F(FaultBrokerTest, AKilledNodeFailsCallsUntilItIsRestarted) {
-    const uint32_t reference = Open(UniquePath("killed"));
-    ASSERT_NE(reference, 0u);
-    ASSERT_TRUE(KillNode());
-    const auto figures = MeasureFault(
-        "kill/restart", [&] { return Write(reference, "6.5"); }, kRequestTimeout + kCallMargin,
-        [] { ASSERT_TRUE(RestartNode()); });
+    const auto figures = MeasureNodeFault("kill/restart", "6.5", KillNode,
+                                          [] { ASSERT_TRUE(RestartNode()); });
     EXPECT_TRUE(figures.firstError);
 }
 
 TEST_F(FaultBrokerTest, AMemoryAlarmTimesCallsOutUntilItClears) {
-    const uint32_t reference = Open(UniquePath("alarm"));
-    ASSERT_NE(reference, 0u);
-    ASSERT_TRUE(SetMemoryAlarm(true));
-    const auto figures = MeasureFault(
-        "memory alarm", [&] { return Write(reference, "7.5"); }, kRequestTimeout + kCallMargin,
+    const auto figures = MeasureNodeFault(
+        "memory alarm", "7.5", [] { return SetMemoryAlarm(true); },
         [] { ASSERT_TRUE(SetMemoryAlarm(false)); });
     EXPECT_EQ(figures.errorStatus, kRequestTimedOut);
 }
 
 }  // namespace
+
+FaultFigures FaultBrokerTest::MeasureNodeFault(
+    const std::string& name, const std::string& value,
+    const std::function<::testing::AssertionResult()>& inject, const std::function<void()>& lift) {
+    const uint32_t reference = Open(UniquePath("node"));
+    EXPECT_NE(reference, 0u);
+    EXPECT_TRUE(inject());
+    return MeasureFault(
+        name, [&] { return Write(reference, value); }, kRequestTimeout + kCallMargin, lift);
+}
+
 }  // namespace Korvane::Veldra::Testing

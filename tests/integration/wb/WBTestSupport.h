@@ -13,17 +13,11 @@
 
 #include "WBHostRuntime.h"
 #include "kvveldra/TagWB.h"
+#include "support/ExportedNumbers.h"
 #include "support/SuiteTagService.h"
 
 namespace Korvane::Veldra::Testing {
 
-enum WBType : int32_t { kDouble = 0, kInt = 1, kString = 2, kBoolean = 3, kUInt64 = 4, kDateTime = 5 };
-
-inline constexpr int32_t kRequestTimedOut = -251001;
-inline constexpr int32_t kInvalidTagReference = -251900;
-inline constexpr int32_t kInvalidTagDataType = -251902;
-inline constexpr int32_t kConflictingTagTypes = -251907;
-inline constexpr int32_t kInvalidState = -251914;
 
 // A new host string with the text.
 WBStrHandle NewHostString(const std::string& text);
