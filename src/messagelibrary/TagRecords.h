@@ -24,6 +24,15 @@ struct TagRecord {
     std::optional<JsonStringMap> properties;
     std::optional<JsonStringList> keywords;
     bool collectAggregates = false;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path)
+            .Field("type", self.type)
+            .Field("properties", self.properties)
+            .Field("keywords", self.keywords)
+            .Field("collectAggregates", self.collectAggregates);
+    }
 };
 
 // A value in its text form, whatever its type, so that 64-bit and date values
@@ -31,6 +40,11 @@ struct TagRecord {
 struct TagValue {
     std::optional<TagDataType> type;
     std::optional<std::string> value;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("type", self.type).Field("value", self.value);
+    }
 };
 
 // Aggregates of a tag's values; min and max are text forms of the tag's type.
@@ -39,12 +53,25 @@ struct TagAggregates {
     double avg = 0.0;
     std::optional<std::string> min;
     std::optional<std::string> max;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("count", self.count)
+            .Field("avg", self.avg)
+            .Field("min", self.min)
+            .Field("max", self.max);
+    }
 };
 
 // A value at its time.
 struct TagValueSample {
     Timestamp timestamp;
     std::optional<TagValue> value;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("timestamp", self.timestamp).Field("value", self.value);
+    }
 };
 
 // A value at its time with the aggregates after it.
@@ -52,24 +79,46 @@ struct TagValueUpdate {
     Timestamp timestamp;
     std::optional<TagValue> value;
     std::optional<TagAggregates> aggregates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("timestamp", self.timestamp)
+            .Field("value", self.value)
+            .Field("aggregates", self.aggregates);
+    }
 };
 
 // The samples of one tag, by path.
 struct TagPathUpdates {
     std::optional<std::string> path;
     std::optional<std::vector<TagValueSample>> updates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path).Field("updates", self.updates);
+    }
 };
 
 // The updates with aggregates of one tag, by path.
 struct TagAggregatedUpdates {
     std::optional<std::string> path;
     std::optional<std::vector<TagValueUpdate>> updates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path).Field("updates", self.updates);
+    }
 };
 
 // The updates of one tag, with the whole tag record.
 struct TagUpdateSet {
     std::optional<TagRecord> tag;
     std::optional<std::vector<TagValueUpdate>> updates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("tag", self.tag).Field("updates", self.updates);
+    }
 };
 
 // The current value and aggregates of one tag.
@@ -77,6 +126,13 @@ struct TagCurrentValue {
     std::optional<std::string> path;
     std::optional<TagValueSample> current;
     std::optional<TagAggregates> aggregates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path)
+            .Field("current", self.current)
+            .Field("aggregates", self.aggregates);
+    }
 };
 
 // A tag and the parts of its metadata that are to change.
@@ -85,26 +141,8 @@ struct TagChange {
     std::optional<TagChangeFlags> changes;
 };
 
-void WriteJsonFields(JsonObjectWriter& out, const TagRecord& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagValue& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagAggregates& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagValueSample& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagValueUpdate& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagPathUpdates& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagAggregatedUpdates& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagUpdateSet& record);
-void WriteJsonFields(JsonObjectWriter& out, const TagCurrentValue& record);
 void WriteJsonFields(JsonObjectWriter& out, const TagChange& record);
 
-bool ReadJsonFields(TagRecord& out, const JsonVariant& object);
-bool ReadJsonFields(TagValue& out, const JsonVariant& object);
-bool ReadJsonFields(TagAggregates& out, const JsonVariant& object);
-bool ReadJsonFields(TagValueSample& out, const JsonVariant& object);
-bool ReadJsonFields(TagValueUpdate& out, const JsonVariant& object);
-bool ReadJsonFields(TagPathUpdates& out, const JsonVariant& object);
-bool ReadJsonFields(TagAggregatedUpdates& out, const JsonVariant& object);
-bool ReadJsonFields(TagUpdateSet& out, const JsonVariant& object);
-bool ReadJsonFields(TagCurrentValue& out, const JsonVariant& object);
 bool ReadJsonFields(TagChange& out, const JsonVariant& object);
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -59,8 +59,19 @@ using JsonStringMap = std::map<std::string, std::string>;
 constexpr int32_t kJsonFieldRefusedCode = ErrorCodes::kFailedToParse;
 constexpr int32_t kJsonRecordFieldRefusedCode = ErrorCodes::kException;
 
+class JsonRecordReader;
+
+// A record lists its fields in a static member template JsonFields (see
+// messagelibrary/MessageFields.h), or reads them in a ReadJsonFields overload.
 template <typename R, typename = void>
-struct IsJsonReadableRecord : std::false_type {};
+struct ListsJsonRecordFields : std::false_type {};
+template <typename R>
+struct ListsJsonRecordFields<R, std::void_t<decltype(R::JsonFields(
+                                    std::declval<R&>(), std::declval<JsonRecordReader&>()))>>
+    : std::true_type {};
+
+template <typename R, typename = void>
+struct IsJsonReadableRecord : ListsJsonRecordFields<R> {};
 template <typename R>
 struct IsJsonReadableRecord<R, std::void_t<decltype(ReadJsonFields(
                                    std::declval<R&>(), std::declval<const JsonVariant&>()))>>
@@ -164,6 +175,24 @@ private:
     const JsonVariant& body_;
 };
 
+// The reader a record's field list is called with: the first refused field
+// refuses the record, and the fields after it are left alone.
+class JsonRecordReader {
+public:
+    explicit JsonRecordReader(const JsonVariant& object) noexcept : object_(object) {}
+
+    template <typename T>
+    JsonRecordReader& Field(std::string_view key, T& out) {
+        if (ok_) ok_ = ReadField(out, object_, key);
+        return *this;
+    }
+    bool Ok() const noexcept { return ok_; }
+
+private:
+    const JsonVariant& object_;
+    bool ok_ = true;
+};
+
 // ---- Template definitions ---------------------------------------------------
 
 namespace JsonReadDetail {
@@ -187,7 +216,14 @@ bool ReadJsonValue(R& out, const JsonVariant* value) {
     value = JsonReadDetail::Present(value);
     out = R{};
     if (value == nullptr || value->IsNull()) return true;
-    return value->IsObject() && ReadJsonFields(out, *value);
+    if (!value->IsObject()) return false;
+    if constexpr (ListsJsonRecordFields<R>::value) {
+        JsonRecordReader reader(*value);
+        R::JsonFields(out, reader);
+        return reader.Ok();
+    } else {
+        return ReadJsonFields(out, *value);
+    }
 }
 
 template <typename T>

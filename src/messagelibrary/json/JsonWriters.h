@@ -57,8 +57,17 @@ struct JsonRaw {
     std::string_view text;
 };
 
+// A record lists its fields in a static member template JsonFields (see
+// messagelibrary/MessageFields.h), or writes them in a WriteJsonFields overload.
 template <typename R, typename = void>
-struct IsJsonWritableRecord : std::false_type {};
+struct ListsJsonWritableFields : std::false_type {};
+template <typename R>
+struct ListsJsonWritableFields<R, std::void_t<decltype(R::JsonFields(
+                                      std::declval<const R&>(), std::declval<JsonObjectWriter&>()))>>
+    : std::true_type {};
+
+template <typename R, typename = void>
+struct IsJsonWritableRecord : ListsJsonWritableFields<R> {};
 template <typename R>
 struct IsJsonWritableRecord<R, std::void_t<decltype(WriteJsonFields(
                                    std::declval<JsonObjectWriter&>(), std::declval<const R&>()))>>
@@ -195,7 +204,11 @@ void AppendJson(std::string& out, const T& value) {
         AppendEnum(out, static_cast<int32_t>(value), JsonEnumTextsOf(value));
     } else if constexpr (IsJsonWritableRecord<T>::value) {
         JsonObjectWriter object(out);
-        WriteJsonFields(object, value);
+        if constexpr (ListsJsonWritableFields<T>::value) {
+            T::JsonFields(value, object);
+        } else {
+            WriteJsonFields(object, value);
+        }
         object.Close();
     } else {
         static_assert(kAlwaysFalse<T>, "no JSON form for this type");

@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -24,25 +23,11 @@ TagInfoQueryTagsRequest::TagInfoQueryTagsRequest(std::optional<JsonStringList> s
 TagInfoQueryTagsRequest::TagInfoQueryTagsRequest(MessageBus::MessageHeaders headers,
                                                  const MessageBus::MessageBody& body)
     : MessageBus::RequestMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json)
-        .Field("searchPaths", searchPaths_)
-        .Field("properties", properties_)
-        .Field("keywords", keywords_)
-        .Field("skip", skip_)
-        .Field("take", take_)
-        .Field("allowStale", allowStale_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoQueryTagsRequest::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter()
-                                       .Field("searchPaths", searchPaths_)
-                                       .Field("properties", properties_)
-                                       .Field("keywords", keywords_)
-                                       .Field("skip", skip_)
-                                       .Field("take", take_)
-                                       .Field("allowStale", allowStale_)
-                                       .Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

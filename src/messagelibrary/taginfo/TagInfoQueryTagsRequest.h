@@ -5,6 +5,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/json/JsonReaders.h"
@@ -35,6 +36,17 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("searchPaths", self.searchPaths_)
+            .Field("properties", self.properties_)
+            .Field("keywords", self.keywords_)
+            .Field("skip", self.skip_)
+            .Field("take", self.take_)
+            .Field("allowStale", self.allowStale_);
+    }
+
     std::optional<JsonStringList> searchPaths_;
     std::optional<JsonStringMap> properties_;
     std::optional<JsonStringList> keywords_;
