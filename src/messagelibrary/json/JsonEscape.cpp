@@ -1,6 +1,7 @@
 #include "messagelibrary/json/JsonEscape.h"
 
 #include <array>
+#include <cstdint>
 #include <cstring>
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
@@ -35,7 +36,36 @@ std::string_view UpToZero(std::string_view text) noexcept {
     return text.substr(0, static_cast<std::size_t>(static_cast<const char*>(zero) - text.data()));
 }
 
+constexpr uint64_t kOnes = 0x0101010101010101ULL;
+constexpr uint64_t kHighs = 0x8080808080808080ULL;
+
+// Whether any of the eight bytes is below n (n at most 128).
+constexpr uint64_t AnyBelow(uint64_t bytes, uint64_t n) noexcept {
+    return (bytes - kOnes * n) & ~bytes & kHighs;
+}
+constexpr uint64_t AnyEqual(uint64_t bytes, unsigned char c) noexcept {
+    return AnyBelow(bytes ^ (kOnes * c), 1);
+}
+
 }  // namespace
+
+std::size_t JsonPlainPrefix(std::string_view text) noexcept {
+    const char* data = text.data();
+    const std::size_t size = text.size();
+    std::size_t i = 0;
+    for (; i + 8 <= size; i += 8) {
+        uint64_t bytes;
+        std::memcpy(&bytes, data + i, sizeof(bytes));
+        // Below 32 covers the zero byte and every control character.
+        if (AnyBelow(bytes, 32) | AnyEqual(bytes, '"') | AnyEqual(bytes, '\\') |
+            AnyEqual(bytes, 127))
+            break;
+    }
+    for (; i < size; ++i) {
+        if (data[i] == '\0' || Escape(data[i]) != 0) break;
+    }
+    return i;
+}
 
 std::size_t JsonEscapedLength(std::string_view text) noexcept {
     std::size_t length = 0;

@@ -85,7 +85,7 @@ bool ReadJsonValue(JsonStringMap& out, const JsonVariant* value) {
     if (value == nullptr || value->IsNull()) return true;
     if (!value->IsObject()) return false;
     for (const JsonMember& member : value->Members()) {
-        if (!ReadJsonValue(out[member.key], &member.value)) return false;
+        if (!ReadJsonValue(out[member.key.ToString()], &member.value)) return false;
     }
     return true;
 }

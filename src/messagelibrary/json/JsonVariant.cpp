@@ -46,7 +46,7 @@ JsonMember* LowerBound(Members* members, std::string_view key) noexcept {
 
 bool IsAt(const Members* members, const JsonMember* position, std::string_view key) noexcept {
     return position != nullptr && position != members->end() &&
-           std::string_view(position->key) == key;
+           position->key == key;
 }
 
 // Sorts by key, keeping the order of equal keys, then keeps only the last of
@@ -358,7 +358,7 @@ JsonVariant& JsonVariant::InsertMember(std::string_view key) {
     if (IsAt(members, position, key)) return position->value;
     const std::size_t index =
         members == nullptr ? 0 : static_cast<std::size_t>(position - members->begin());
-    JsonMember member{std::string(key), JsonVariant()};
+    JsonMember member{JsonKey(key), JsonVariant()};
     if (members == nullptr) members = JsonBlock::Create<JsonMember>(4);
     JsonVariant& value = JsonBlock::Insert(members, index, std::move(member)).value;
     Store(kWord, members);
@@ -541,7 +541,7 @@ void JsonObjectBuilder::Reserve(std::size_t count) {
 
 void JsonObjectBuilder::Add(std::string_view key, JsonVariant&& value) {
     if (members_ == nullptr) members_ = JsonBlock::Create<JsonMember>(4);
-    JsonBlock::Emplace(members_, std::string(key), std::move(value));
+    JsonBlock::Emplace(members_, JsonKey(key), std::move(value));
 }
 
 void JsonObjectBuilder::Finish(JsonVariant& target) {

@@ -5,6 +5,8 @@
 #include <string>
 #include <string_view>
 
+#include "messagelibrary/json/JsonKey.h"
+
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
 // The kinds of a JsonVariant. The numbers are fixed: they are also the token
@@ -216,7 +218,7 @@ private:
 
 // One member of an object.
 struct JsonMember {
-    std::string key;
+    JsonKey key;
     JsonVariant value;
 };
 

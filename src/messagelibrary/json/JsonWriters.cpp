@@ -56,6 +56,14 @@ void AppendJsonTimestamp(std::string& out, const Timestamp& value) {
 }
 
 void AppendJsonString(std::string& out, std::string_view text) {
+    // Most texts need no escape: they are copied in one piece.
+    const std::size_t plain = JsonPlainPrefix(text);
+    if (plain == text.size() || text[plain] == '\0') {
+        out.push_back('"');
+        out.append(text.data(), plain);
+        out.push_back('"');
+        return;
+    }
     const std::size_t length = JsonEscapedLength(text);
     const std::size_t start = out.size();
     out.resize(start + length + 2);

@@ -24,15 +24,18 @@ const ptime& UnixEpoch() {
 constexpr int64_t kFirstMicros = -17987443200LL * kMicrosPerSecond;
 constexpr int64_t kLastMicros = 253402300800LL * kMicrosPerSecond - 1;
 
-void AppendDigits(std::string& out, int64_t value, int width) {
-    char buffer[24];
-    int position = width;
-    buffer[position] = '\0';
-    while (position > 0) {
-        buffer[--position] = static_cast<char>('0' + value % 10);
+// Writes value in width digits, zero-padded, and returns the position behind them.
+char* PutDigits(char* at, int64_t value, int width) {
+    for (int position = width; position > 0;) {
+        at[--position] = static_cast<char>('0' + value % 10);
         value /= 10;
     }
-    out.append(buffer, static_cast<std::size_t>(width));
+    return at + width;
+}
+
+char* PutSeparated(char* at, char separator, int64_t value) {
+    *at = separator;
+    return PutDigits(at + 1, value, 2);
 }
 
 // Parses a piece of decimal digits; an empty piece is 0.
@@ -162,22 +165,20 @@ void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
     const int64_t secondsOfDay = rest / kMicrosPerSecond;
     const int64_t fraction = rest % kMicrosPerSecond;
 
-    AppendDigits(out, date.year, 4);
-    out.push_back('-');
-    AppendDigits(out, date.month, 2);
-    out.push_back('-');
-    AppendDigits(out, date.day, 2);
-    out.push_back('T');
-    AppendDigits(out, secondsOfDay / 3600, 2);
-    out.push_back(':');
-    AppendDigits(out, secondsOfDay / 60 % 60, 2);
-    out.push_back(':');
-    AppendDigits(out, secondsOfDay % 60, 2);
+    // Built in place, then appended at once: "YYYY-MM-DDThh:mm:ss[.ffffff]Z".
+    char text[32];
+    char* at = PutDigits(text, date.year, 4);
+    at = PutSeparated(at, '-', date.month);
+    at = PutSeparated(at, '-', date.day);
+    at = PutSeparated(at, 'T', secondsOfDay / 3600);
+    at = PutSeparated(at, ':', secondsOfDay / 60 % 60);
+    at = PutSeparated(at, ':', secondsOfDay % 60);
     if (fraction != 0) {
-        out.push_back('.');
-        AppendDigits(out, fraction, 6);
+        *at++ = '.';
+        at = PutDigits(at, fraction, 6);
     }
-    out.push_back('Z');
+    *at++ = 'Z';
+    out.append(text, at);
 }
 
 std::string TimestampToText(const Timestamp& timestamp) {

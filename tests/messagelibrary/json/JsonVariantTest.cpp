@@ -87,7 +87,7 @@ TEST(JsonVariant, MemberSettersKeepKeysSortedAndUnique) {
     json.SetString(std::string_view("a\0z", 3), "with zero");
     ASSERT_TRUE(json.IsObject());
     std::string keys;
-    for (const JsonMember& m : json.Members()) keys += m.key + "|";
+    for (const JsonMember& m : json.Members()) keys += m.key.ToString() + "|";
     EXPECT_EQ(keys, std::string("a|a\0z|ab|b|", 11));
     EXPECT_EQ(json.Find("a")->AsNumber(), 4000000000.0);
     EXPECT_EQ(json.Find("b")->AsText(), "replaced");
@@ -178,8 +178,8 @@ TEST(JsonObjectBuilder, SortsOnceAndKeepsTheLastOfEqualKeys) {
     EXPECT_EQ(json.Find("5")->AsNumber(), 5.0);
     std::string previous;
     for (const JsonMember& m : json.Members()) {
-        EXPECT_LT(previous, m.key);
-        previous = m.key;
+        EXPECT_LT(previous, m.key.ToString());
+        previous = m.key.ToString();
     }
 }
 

@@ -1,0 +1,96 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+#include <ostream>
+#include <string>
+#include <string_view>
+
+namespace Korvane::Veldra::VeldraMessageLibrary {
+
+// The key of an object member, in 16 bytes: a key of up to 15 bytes stands in
+// place with its terminating zero, a longer one is on the heap. Keys are
+// mostly short field names, so a parsed object costs no allocation for them,
+// and members move as plain bytes when an object is sorted.
+class JsonKey {
+public:
+    JsonKey() noexcept { Clear(); }
+    explicit JsonKey(std::string_view text) {
+        if (text.size() <= kInline) {
+            std::memcpy(bytes_, text.data(), text.size());
+            bytes_[text.size()] = '\0';
+            bytes_[kMarker] = static_cast<char>(kInline - text.size());
+            return;
+        }
+        char* heap = new char[text.size() + 1];
+        std::memcpy(heap, text.data(), text.size());
+        heap[text.size()] = '\0';
+        const uint64_t size = text.size();
+        std::memcpy(bytes_, &heap, sizeof(heap));
+        std::memcpy(bytes_ + sizeof(heap), &size, 7);  // little-endian: the low 7 bytes
+        bytes_[kMarker] = kHeapMarker;
+    }
+    JsonKey(JsonKey&& other) noexcept {
+        std::memcpy(bytes_, other.bytes_, sizeof(bytes_));
+        other.Clear();
+    }
+    JsonKey& operator=(JsonKey&& other) noexcept {
+        if (this != &other) {
+            Free();
+            std::memcpy(bytes_, other.bytes_, sizeof(bytes_));
+            other.Clear();
+        }
+        return *this;
+    }
+    JsonKey(const JsonKey&) = delete;
+    JsonKey& operator=(const JsonKey&) = delete;
+    ~JsonKey() { Free(); }
+
+    std::string_view View() const noexcept { return {c_str(), size()}; }
+    operator std::string_view() const noexcept { return View(); }
+    std::string ToString() const { return std::string(View()); }
+    const char* c_str() const noexcept { return IsHeap() ? HeapText() : bytes_; }
+    std::size_t size() const noexcept {
+        if (!IsHeap()) return kInline - static_cast<unsigned char>(bytes_[kMarker]);
+        uint64_t size = 0;
+        std::memcpy(&size, bytes_ + sizeof(char*), 7);
+        return static_cast<std::size_t>(size);
+    }
+
+    friend bool operator==(const JsonKey& a, std::string_view b) noexcept { return a.View() == b; }
+    friend bool operator==(std::string_view a, const JsonKey& b) noexcept { return a == b.View(); }
+    friend bool operator==(const JsonKey& a, const JsonKey& b) noexcept {
+        return a.View() == b.View();
+    }
+    friend bool operator!=(const JsonKey& a, std::string_view b) noexcept { return !(a == b); }
+    friend bool operator!=(const JsonKey& a, const JsonKey& b) noexcept { return !(a == b); }
+    friend std::ostream& operator<<(std::ostream& out, const JsonKey& key) {
+        return out << key.View();
+    }
+
+private:
+    static constexpr std::size_t kInline = 15;
+    static constexpr std::size_t kMarker = 15;  // 15 - length, or kHeapMarker
+    static constexpr char kHeapMarker = static_cast<char>(0xFF);
+
+    bool IsHeap() const noexcept { return bytes_[kMarker] == kHeapMarker; }
+    char* HeapText() const noexcept {
+        char* heap;
+        std::memcpy(&heap, bytes_, sizeof(heap));
+        return heap;
+    }
+    void Clear() noexcept {
+        bytes_[0] = '\0';
+        bytes_[kMarker] = static_cast<char>(kInline);
+    }
+    void Free() noexcept {
+        if (IsHeap()) delete[] HeapText();
+    }
+
+    char bytes_[16];
+};
+
+static_assert(sizeof(JsonKey) == 16, "a key is two words");
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary
