@@ -27,12 +27,13 @@
 
 #include "kvveldra/TagConsole.h"
 #include "messagebus/amqp/AmqpPropertiesC.h"
-#include "taglibrary/exports/ConsoleTime.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
 #include "messagelibrary/tagingestion/TagUpdateValuesRoutedMessage.h"
 #include "support/BrokerEnvironment.h"
+#include "support/Ratios.h"
 #include "support/TagServiceProcess.h"
+#include "taglibrary/exports/ConsoleTime.h"
 
 namespace {
 
@@ -104,7 +105,8 @@ void Check(amqp_rpc_reply_t reply, const char* what) {
 class RawClient {
 public:
     RawClient(const Testing::BrokerSettings& broker, const std::string& exchange)
-        : state_(amqp_new_connection()), exchange_(exchange),
+        : state_(amqp_new_connection()),
+          exchange_(exchange),
           name_("RawBench" + std::to_string(getpid())) {
         amqp_socket_t* socket = amqp_tcp_socket_new(state_);
         if (socket == nullptr ||
@@ -125,8 +127,8 @@ public:
                         amqp_cstring_bytes(exchange.c_str()), amqp_cstring_bytes(key.c_str()),
                         amqp_empty_table);
         Check(amqp_get_rpc_reply(state_), "queue.bind");
-        amqp_basic_consume(state_, 1, amqp_cstring_bytes(name_.c_str()), amqp_empty_bytes, 0, 1,
-                           0, amqp_empty_table);
+        amqp_basic_consume(state_, 1, amqp_cstring_bytes(name_.c_str()), amqp_empty_bytes, 0, 1, 0,
+                           amqp_empty_table);
         Check(amqp_get_rpc_reply(state_), "basic.consume");
     }
     ~RawClient() {
@@ -197,16 +199,15 @@ void Timed(benchmark::State& state, int64_t valuesPerCall, Call call) {
             state.SkipWithError(failure.c_str());
             return;
         }
-        micros.push_back(
-            std::chrono::duration<double, std::micro>(Clock::now() - start).count());
+        micros.push_back(std::chrono::duration<double, std::micro>(Clock::now() - start).count());
     }
     Report(state, micros, valuesPerCall);
 }
 
 TagConsoleSamples Samples(int count) {
     TagConsoleSamples samples;
-    const auto now = std::chrono::time_point_cast<std::chrono::microseconds>(
-        std::chrono::system_clock::now());
+    const auto now =
+        std::chrono::time_point_cast<std::chrono::microseconds>(std::chrono::system_clock::now());
     for (int i = 0; i < count; ++i) {
         samples.push_back({std::to_string(i) + ".5", now + std::chrono::microseconds(i)});
     }
@@ -300,4 +301,19 @@ BENCHMARK(ConsoleWrite)
 
 }  // namespace
 
-BENCHMARK_MAIN();
+int main(int argc, char** argv) {
+    using Korvane::Veldra::Bench::PrintRatio;
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
+    const auto figures = Korvane::Veldra::Bench::RunWithRatios();
+    PrintRatio("TagConsoleWriteTag p50 / raw", figures.Get("ConsoleWrite/1", "p50_us"),
+               figures.Get("RawWrite/1", "p50_us"), "<= 1.15");
+    PrintRatio("TagConsoleReadValues p50 / raw", figures.Get("ConsoleRead", "p50_us"),
+               figures.Get("RawRead", "p50_us"), "-");
+    const std::string many = "/" + std::to_string(kManySamples);
+    PrintRatio("values/s in writes of " + std::to_string(kManySamples) + ", console / raw",
+               figures.Get("ConsoleWrite" + many, "values_per_s"),
+               figures.Get("RawWrite" + many, "values_per_s"), "-");
+    benchmark::Shutdown();
+    return 0;
+}

@@ -23,6 +23,7 @@
 #include "rapidjson/document.h"
 #include "rapidjson/stringbuffer.h"
 #include "rapidjson/writer.h"
+#include "support/Ratios.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::Bench {
 
@@ -373,4 +374,35 @@ BENCHMARK(RapidWriteMessage<Update, Updates>)
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::Bench
 
-BENCHMARK_MAIN();
+namespace {
+
+using Korvane::Veldra::Bench::PrintRatio;
+using Korvane::Veldra::Bench::RatioFigures;
+
+// Throughput of a run; the median when the run was repeated.
+double BytesPerSecond(const RatioFigures& figures, const std::string& run) {
+    const double median = figures.Get(run + "_median", "bytes_per_second");
+    return median > 0 ? median : figures.Get(run, "bytes_per_second");
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    benchmark::Initialize(&argc, argv);
+    if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
+    const RatioFigures figures = Korvane::Veldra::Bench::RunWithRatios();
+    for (const char* body : {"Query", "Update"}) {
+        const std::string b(body);
+        const double rapidParse = BytesPerSecond(figures, b + "/Parse/RapidJSON");
+        PrintRatio(b + " parse, library / RapidJSON DOM",
+                   BytesPerSecond(figures, b + "/Parse/Library"), rapidParse, ">= 1.0");
+        PrintRatio(b + " write, library / RapidJSON Writer",
+                   BytesPerSecond(figures, b + "/Write/Library"),
+                   BytesPerSecond(figures, b + "/Write/RapidJSON"), ">= 1.2");
+        PrintRatio(b + " parse and read fields / RapidJSON DOM parse",
+                   BytesPerSecond(figures, b + "/ParseAndRead/Library"), rapidParse,
+                   b == "Query" ? ">= 0.8" : "-");
+    }
+    benchmark::Shutdown();
+    return 0;
+}

@@ -10,6 +10,7 @@
 // (<build>/tests/integration/broker/broker.env); without a broker the
 // benchmark says so and does nothing.
 #include <benchmark/benchmark.h>
+
 #include <cstdio>
 #include <memory>
 #include <string>
@@ -139,13 +140,8 @@ BENCHMARK(BM_AcknowledgedWrites)
     ->MinTime(2.0)
     ->UseRealTime()
     ->Unit(benchmark::kMillisecond);
-BENCHMARK(BM_Query)
-    ->ArgNames({"page"})
-    ->Arg(0)
-    ->Arg(1)
-    ->MinTime(2.0)
-    ->UseRealTime()
-    ->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_Query)->ArgNames({"page"})->Arg(0)->Arg(1)->MinTime(2.0)->UseRealTime()->Unit(
+    benchmark::kMillisecond);
 
 }  // namespace
 
