@@ -8,7 +8,8 @@ namespace {
 // The console's report, with each run's figures kept as well.
 class CollectingReporter : public benchmark::ConsoleReporter {
 public:
-    explicit CollectingReporter(RatioFigures& figures) : figures_(figures) {}
+    // Without colours: the ratio lines are read back from the output.
+    explicit CollectingReporter(RatioFigures& figures) : ConsoleReporter(OO_Tabular), figures_(figures) {}
 
     void ReportRuns(const std::vector<Run>& runs) override {
         ConsoleReporter::ReportRuns(runs);
