@@ -18,9 +18,16 @@ struct ErrorRecord {
     std::optional<std::vector<ErrorRecord>> innerErrors;
     std::optional<std::string> resourceId;
     std::optional<std::string> resourceType;
-};
 
-void WriteJsonFields(JsonObjectWriter& out, const ErrorRecord& record);
-bool ReadJsonFields(ErrorRecord& out, const JsonVariant& object);
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("name", self.name)
+            .Field("message", self.message)
+            .Field("args", self.args)
+            .Field("innerErrors", self.innerErrors)
+            .Field("resourceId", self.resourceId)
+            .Field("resourceType", self.resourceType);
+    }
+};
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -1,8 +1,8 @@
-// The parsing constructors of the tag and trace logger messages. The first
-// byte picks the class, the rest is the body. A body either parses or is
-// refused with VeldraException (or the conversion failure of a numeric text);
-// what parses is written, and when that text parses again it must be written
-// with the same bytes.
+// The parsing constructors of the tag, historian, subscription, selection and
+// trace logger messages. The first byte picks the class, the rest is the body.
+// A body either parses or is refused with VeldraException (or the conversion
+// failure of a numeric text); what parses is written, and when that text
+// parses again it must be written with the same bytes.
 
 #include <boost/lexical_cast.hpp>
 #include <cstddef>
@@ -16,6 +16,34 @@
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
 #include "messagelibrary/tagcurrentvalue/TagCvResetAggregatesRoutedMessage.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncQueryCompleteRoutedMessage.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncQueryDataRoutedMessage.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncQueryRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncQueryResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncSubscribeRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncSubscribeResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncUnsubscribeRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncUnsubscribeResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianAsyncValuesProcessedRoutedMessage.h"
+#include "messagelibrary/taghistorian/TagHistorianDeleteValuesByIdRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianDeleteValuesByIdResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianDeleteValuesByRangeRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianDeleteValuesByRangeResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianFlushValuesRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianFlushValuesResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianQueryRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianQueryResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianUpdateValuesRequest.h"
+#include "messagelibrary/taghistorian/TagHistorianUpdateValuesResponse.h"
+#include "messagelibrary/taghistorian/TagHistorianValuesProcessedBroadcast.h"
+#include "messagelibrary/taghttp/TagHttpCreateSelectionRequest.h"
+#include "messagelibrary/taghttp/TagHttpCreateSelectionResponse.h"
+#include "messagelibrary/taghttp/TagHttpDeleteSelectionRoutedMessage.h"
+#include "messagelibrary/taghttp/TagHttpGetSelectionRequest.h"
+#include "messagelibrary/taghttp/TagHttpGetSelectionResponse.h"
+#include "messagelibrary/taghttp/TagHttpGetSelectionsRequest.h"
+#include "messagelibrary/taghttp/TagHttpGetSelectionsResponse.h"
+#include "messagelibrary/taghttp/TagHttpUpdateSelectionRoutedMessage.h"
 #include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsRequest.h"
 #include "messagelibrary/taginfo/TagInfoCreateOrUpdateTagsResponse.h"
 #include "messagelibrary/taginfo/TagInfoCreateTagRoutedMessage.h"
@@ -28,6 +56,21 @@
 #include "messagelibrary/tagingestion/TagNewJournalsWrittenBroadcast.h"
 #include "messagelibrary/tagingestion/TagNewTagsIngestedBroadcast.h"
 #include "messagelibrary/tagingestion/TagUpdateValuesRoutedMessage.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetSubscriptionRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetSubscriptionResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetSubscriptionsRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetSubscriptionsResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetUpdatesRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorGetUpdatesResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorMessageWrapperRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorMessageWrapperResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorPushedUpdateRoutedMessage.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscribeRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscribeResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscriptionHeartbeatRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscriptionHeartbeatResponse.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorUnsubscribeRequest.h"
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorUnsubscribeResponse.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandRequest.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandResponse.h"
@@ -78,6 +121,55 @@ constexpr Parser kParsers[] = {
     ParseAs<TraceLoggerMessages::TraceLoggerStoreEntriesRoutedMessage>,
     ParseAs<TraceLoggerMessages::TraceLoggerTracePointListRequest>,
     ParseAs<TraceLoggerMessages::TraceLoggerTracePointListResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncQueryCompleteRoutedMessage>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncQueryDataRoutedMessage>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncQueryRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncQueryResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncSubscribeRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncSubscribeResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncUnsubscribeRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncUnsubscribeResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianAsyncValuesProcessedRoutedMessage>,
+    ParseAs<TagHistorianMessages::TagHistorianDeleteValuesByIdRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianDeleteValuesByIdResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianDeleteValuesByRangeRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianDeleteValuesByRangeResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianFlushValuesRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianFlushValuesResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianQueryRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianQueryResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianUpdateValuesRequest>,
+    ParseAs<TagHistorianMessages::TagHistorianUpdateValuesResponse>,
+    ParseAs<TagHistorianMessages::TagHistorianValuesProcessedBroadcast>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetSubscriptionRequest>,
+    ParseAs<
+        TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetSubscriptionResponse>,
+    ParseAs<
+        TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetSubscriptionsRequest>,
+    ParseAs<
+        TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetSubscriptionsResponse>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetUpdatesRequest>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorGetUpdatesResponse>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorMessageWrapperRequest>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorMessageWrapperResponse>,
+    ParseAs<
+        TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorPushedUpdateRoutedMessage>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorSubscribeRequest>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorSubscribeResponse>,
+    ParseAs<TagSubscriptionCommunicatorMessages::
+                TagSubscriptionCommunicatorSubscriptionHeartbeatRequest>,
+    ParseAs<TagSubscriptionCommunicatorMessages::
+                TagSubscriptionCommunicatorSubscriptionHeartbeatResponse>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorUnsubscribeRequest>,
+    ParseAs<TagSubscriptionCommunicatorMessages::TagSubscriptionCommunicatorUnsubscribeResponse>,
+    ParseAs<TagHttpMessages::TagHttpCreateSelectionRequest>,
+    ParseAs<TagHttpMessages::TagHttpCreateSelectionResponse>,
+    ParseAs<TagHttpMessages::TagHttpDeleteSelectionRoutedMessage>,
+    ParseAs<TagHttpMessages::TagHttpGetSelectionRequest>,
+    ParseAs<TagHttpMessages::TagHttpGetSelectionResponse>,
+    ParseAs<TagHttpMessages::TagHttpGetSelectionsRequest>,
+    ParseAs<TagHttpMessages::TagHttpGetSelectionsResponse>,
+    ParseAs<TagHttpMessages::TagHttpUpdateSelectionRoutedMessage>,
 };
 constexpr std::size_t kParserCount = sizeof(kParsers) / sizeof(kParsers[0]);
 

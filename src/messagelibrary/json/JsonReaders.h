@@ -34,6 +34,7 @@
 //   enumeration (JsonEnum.h)    value 0             value 0      its text, exactly; a number
 //   JsonStringList, vector<T>   empty               empty        array, each element as T
 //   JsonStringMap               empty               empty        object of texts (null: "")
+//   map<std::string, T>         empty               empty        object, each member as T
 //   record (see below)          default             default      object, field by field
 //
 // A text that a numeric reader cannot convert throws boost::bad_lexical_cast.
@@ -96,6 +97,8 @@ template <typename R, std::enable_if_t<IsJsonReadableRecord<R>::value, int> = 0>
 bool ReadJsonValue(R& out, const JsonVariant* value);
 template <typename T>
 bool ReadJsonValue(std::vector<T>& out, const JsonVariant* value);
+template <typename T>
+bool ReadJsonValue(std::map<std::string, T>& out, const JsonVariant* value);
 template <typename T>
 bool ReadJsonValue(std::optional<T>& out, const JsonVariant* value);
 
@@ -236,6 +239,18 @@ bool ReadJsonValue(std::vector<T>& out, const JsonVariant* value) {
     std::size_t index = 0;
     for (const JsonVariant& element : value->Elements()) {
         if (!ReadJsonValue(out[index++], &element)) return false;
+    }
+    return true;
+}
+
+template <typename T>
+bool ReadJsonValue(std::map<std::string, T>& out, const JsonVariant* value) {
+    value = JsonReadDetail::Present(value);
+    out.clear();
+    if (value == nullptr || value->IsNull()) return true;
+    if (!value->IsObject()) return false;
+    for (const JsonMember& member : value->Members()) {
+        if (!ReadJsonValue(out[member.key], &member.value)) return false;
     }
     return true;
 }

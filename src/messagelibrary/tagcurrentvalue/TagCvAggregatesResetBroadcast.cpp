@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages {
 
@@ -16,12 +15,11 @@ TagCvAggregatesResetBroadcast::TagCvAggregatesResetBroadcast(
 TagCvAggregatesResetBroadcast::TagCvAggregatesResetBroadcast(MessageBus::MessageHeaders headers,
                                                              const MessageBus::MessageBody& body)
     : MessageBus::BroadcastMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("updates", updates_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagCvAggregatesResetBroadcast::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("updates", updates_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages

@@ -6,6 +6,7 @@
 
 #include "messagelibrary/BroadcastMessage.h"
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/TagRecords.h"
 
@@ -28,6 +29,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("updates", self.updates_);
+    }
+
     std::optional<std::vector<TagAggregatedUpdates>> updates_;
 };
 

@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages {
 
@@ -19,13 +18,11 @@ TagCvQueryCurrentValuesByPathRequest::TagCvQueryCurrentValuesByPathRequest(
 TagCvQueryCurrentValuesByPathRequest::TagCvQueryCurrentValuesByPathRequest(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RequestMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("paths", paths_).Field("allowStale", allowStale_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagCvQueryCurrentValuesByPathRequest::Serialize() const {
-    return MessageBus::MessageBody(
-        JsonBodyWriter().Field("paths", paths_).Field("allowStale", allowStale_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages

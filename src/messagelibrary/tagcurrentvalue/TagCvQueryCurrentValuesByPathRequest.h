@@ -4,6 +4,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/json/JsonReaders.h"
@@ -26,6 +27,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("paths", self.paths_).Field("allowStale", self.allowStale_);
+    }
+
     std::optional<JsonStringList> paths_;
     bool allowStale_ = false;
 };

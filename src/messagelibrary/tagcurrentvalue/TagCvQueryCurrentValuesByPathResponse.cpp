@@ -4,8 +4,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages {
 
@@ -26,12 +25,11 @@ TagCvQueryCurrentValuesByPathResponse::TagCvQueryCurrentValuesByPathResponse(
 TagCvQueryCurrentValuesByPathResponse::TagCvQueryCurrentValuesByPathResponse(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::ResponseMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("values", values_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagCvQueryCurrentValuesByPathResponse::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("values", values_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages

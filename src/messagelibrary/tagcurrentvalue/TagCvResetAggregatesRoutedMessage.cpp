@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages {
 
@@ -18,12 +17,11 @@ TagCvResetAggregatesRoutedMessage::TagCvResetAggregatesRoutedMessage(
 TagCvResetAggregatesRoutedMessage::TagCvResetAggregatesRoutedMessage(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("paths", paths_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagCvResetAggregatesRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("paths", paths_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagCurrentValueMessages

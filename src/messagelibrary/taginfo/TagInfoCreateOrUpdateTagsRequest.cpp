@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -18,13 +17,11 @@ TagInfoCreateOrUpdateTagsRequest::TagInfoCreateOrUpdateTagsRequest(
 TagInfoCreateOrUpdateTagsRequest::TagInfoCreateOrUpdateTagsRequest(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RequestMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("tags", tags_).Field("merge", merge_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoCreateOrUpdateTagsRequest::Serialize() const {
-    return MessageBus::MessageBody(
-        JsonBodyWriter().Field("tags", tags_).Field("merge", merge_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/TagRecords.h"
@@ -28,6 +29,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("tags", self.tags_).Field("merge", self.merge_);
+    }
+
     std::optional<std::vector<TagChange>> tags_;
     bool merge_ = false;
 };

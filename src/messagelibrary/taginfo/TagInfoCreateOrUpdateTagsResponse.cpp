@@ -4,8 +4,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -25,12 +24,11 @@ TagInfoCreateOrUpdateTagsResponse::TagInfoCreateOrUpdateTagsResponse(
 TagInfoCreateOrUpdateTagsResponse::TagInfoCreateOrUpdateTagsResponse(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::ResponseMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("errors", errors_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoCreateOrUpdateTagsResponse::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("errors", errors_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

@@ -7,6 +7,7 @@
 #include "messagelibrary/ErrorRecord.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/ResponseMessage.h"
 
@@ -32,6 +33,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("errors", self.errors_);
+    }
+
     std::optional<ErrorRecord> errors_;
 };
 

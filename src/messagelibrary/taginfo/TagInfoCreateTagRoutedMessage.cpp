@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -16,12 +15,11 @@ TagInfoCreateTagRoutedMessage::TagInfoCreateTagRoutedMessage(std::optional<TagRe
 TagInfoCreateTagRoutedMessage::TagInfoCreateTagRoutedMessage(MessageBus::MessageHeaders headers,
                                                              const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("newTag", newTag_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoCreateTagRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("newTag", newTag_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

@@ -4,6 +4,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RoutedMessage.h"
 #include "messagelibrary/TagRecords.h"
@@ -25,6 +26,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("newTag", self.newTag_);
+    }
+
     std::optional<TagRecord> newTag_;
 };
 

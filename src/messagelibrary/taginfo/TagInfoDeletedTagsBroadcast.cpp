@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -15,12 +14,11 @@ TagInfoDeletedTagsBroadcast::TagInfoDeletedTagsBroadcast(std::optional<JsonStrin
 TagInfoDeletedTagsBroadcast::TagInfoDeletedTagsBroadcast(MessageBus::MessageHeaders headers,
                                                          const MessageBus::MessageBody& body)
     : MessageBus::BroadcastMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("tags", tags_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoDeletedTagsBroadcast::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("tags", tags_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

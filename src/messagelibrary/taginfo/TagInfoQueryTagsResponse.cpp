@@ -4,8 +4,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -27,13 +26,11 @@ TagInfoQueryTagsResponse::TagInfoQueryTagsResponse(
 TagInfoQueryTagsResponse::TagInfoQueryTagsResponse(MessageBus::MessageHeaders headers,
                                                    const MessageBus::MessageBody& body)
     : MessageBus::ResponseMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("tags", tags_).Field("totalCount", totalCount_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoQueryTagsResponse::Serialize() const {
-    return MessageBus::MessageBody(
-        JsonBodyWriter().Field("tags", tags_).Field("totalCount", totalCount_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

@@ -8,6 +8,7 @@
 #include "messagebus/interfaces/IRoutingSource.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/ResponseMessage.h"
 #include "messagelibrary/TagRecords.h"
@@ -34,6 +35,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("tags", self.tags_).Field("totalCount", self.totalCount_);
+    }
+
     std::optional<std::vector<TagRecord>> tags_;
     int32_t totalCount_ = 0;
 };

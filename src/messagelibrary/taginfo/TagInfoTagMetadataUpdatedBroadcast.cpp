@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -16,12 +15,11 @@ TagInfoTagMetadataUpdatedBroadcast::TagInfoTagMetadataUpdatedBroadcast(
 TagInfoTagMetadataUpdatedBroadcast::TagInfoTagMetadataUpdatedBroadcast(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::BroadcastMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("updatedTag", updatedTag_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoTagMetadataUpdatedBroadcast::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("updatedTag", updatedTag_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

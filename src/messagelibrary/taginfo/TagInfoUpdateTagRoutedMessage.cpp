@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages {
 
@@ -23,23 +22,11 @@ TagInfoUpdateTagRoutedMessage::TagInfoUpdateTagRoutedMessage(
 TagInfoUpdateTagRoutedMessage::TagInfoUpdateTagRoutedMessage(MessageBus::MessageHeaders headers,
                                                              const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json)
-        .Field("path", path_)
-        .Field("keywords", keywords_)
-        .Field("properties", properties_)
-        .Field("collectAggregates", collectAggregates_)
-        .Field("replace", replace_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagInfoUpdateTagRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter()
-                                       .Field("path", path_)
-                                       .Field("keywords", keywords_)
-                                       .Field("properties", properties_)
-                                       .Field("collectAggregates", collectAggregates_)
-                                       .Field("replace", replace_)
-                                       .Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagInfoMessages

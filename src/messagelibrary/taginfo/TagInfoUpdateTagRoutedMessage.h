@@ -4,6 +4,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RoutedMessage.h"
 #include "messagelibrary/TagEnums.h"
@@ -37,6 +38,16 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path_)
+            .Field("keywords", self.keywords_)
+            .Field("properties", self.properties_)
+            .Field("collectAggregates", self.collectAggregates_)
+            .Field("replace", self.replace_);
+    }
+
     std::optional<std::string> path_;
     std::optional<JsonStringList> keywords_;
     std::optional<JsonStringMap> properties_;

@@ -5,6 +5,7 @@
 
 #include "messagelibrary/BroadcastMessage.h"
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/json/JsonReaders.h"
 
@@ -25,6 +26,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("journalIds", self.journalIds_);
+    }
+
     std::optional<JsonStringList> journalIds_;
 };
 

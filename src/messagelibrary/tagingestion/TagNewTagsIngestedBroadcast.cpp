@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagIngestionMessages {
 
@@ -16,12 +15,11 @@ TagNewTagsIngestedBroadcast::TagNewTagsIngestedBroadcast(
 TagNewTagsIngestedBroadcast::TagNewTagsIngestedBroadcast(MessageBus::MessageHeaders headers,
                                                          const MessageBus::MessageBody& body)
     : MessageBus::BroadcastMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("updates", updates_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagNewTagsIngestedBroadcast::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("updates", updates_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagIngestionMessages

@@ -3,9 +3,8 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/TagServices.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TagIngestionMessages {
 
@@ -17,12 +16,11 @@ TagUpdateValuesRoutedMessage::TagUpdateValuesRoutedMessage(
 TagUpdateValuesRoutedMessage::TagUpdateValuesRoutedMessage(MessageBus::MessageHeaders headers,
                                                            const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("updates", updates_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TagUpdateValuesRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("updates", updates_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TagIngestionMessages

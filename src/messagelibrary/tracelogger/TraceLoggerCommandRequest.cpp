@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/tracelogger/TraceLoggerService.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
@@ -16,12 +15,11 @@ TraceLoggerCommandRequest::TraceLoggerCommandRequest(std::optional<JsonStringLis
 TraceLoggerCommandRequest::TraceLoggerCommandRequest(MessageBus::MessageHeaders headers,
                                                      const MessageBus::MessageBody& body)
     : MessageBus::RequestMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("arguments", arguments_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TraceLoggerCommandRequest::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("arguments", arguments_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

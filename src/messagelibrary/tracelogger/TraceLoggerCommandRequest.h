@@ -4,6 +4,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/json/JsonReaders.h"
@@ -25,6 +26,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("arguments", self.arguments_);
+    }
+
     std::optional<JsonStringList> arguments_;
 };
 

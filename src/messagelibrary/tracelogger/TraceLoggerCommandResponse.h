@@ -6,6 +6,7 @@
 #include "messagebus/interfaces/IRoutingSource.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/ResponseMessage.h"
 #include "messagelibrary/json/JsonReaders.h"
@@ -31,6 +32,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("responseText", self.responseText_);
+    }
+
     std::optional<JsonStringList> responseText_;
 };
 

@@ -28,6 +28,14 @@ struct TracePointSetting {
     bool enabled = false;
     std::optional<JsonStringList> exceptions;
     std::optional<std::string> times;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("name", self.name)
+            .Field("enabled", self.enabled)
+            .Field("exceptions", self.exceptions)
+            .Field("times", self.times);
+    }
 };
 
 // One line of trace from a module.
@@ -37,11 +45,15 @@ struct TraceEntry {
     std::optional<std::string> tracePointName;
     std::optional<std::string> text;
     std::optional<TraceEntryType> type;
-};
 
-void WriteJsonFields(JsonObjectWriter& out, const TracePointSetting& record);
-void WriteJsonFields(JsonObjectWriter& out, const TraceEntry& record);
-bool ReadJsonFields(TracePointSetting& out, const JsonVariant& object);
-bool ReadJsonFields(TraceEntry& out, const JsonVariant& object);
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("moduleName", self.moduleName)
+            .Field("timestamp", self.timestamp)
+            .Field("tracePointName", self.tracePointName)
+            .Field("text", self.text)
+            .Field("type", self.type);
+    }
+};
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/tracelogger/TraceLoggerService.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
@@ -17,13 +16,11 @@ TraceLoggerRegisterTracePointRoutedMessage::TraceLoggerRegisterTracePointRoutedM
 TraceLoggerRegisterTracePointRoutedMessage::TraceLoggerRegisterTracePointRoutedMessage(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("tracePointName", tracePointName_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TraceLoggerRegisterTracePointRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(
-        JsonBodyWriter().Field("tracePointName", tracePointName_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/tracelogger/TraceLoggerService.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
@@ -17,12 +16,11 @@ TraceLoggerStoreEntriesRoutedMessage::TraceLoggerStoreEntriesRoutedMessage(
 TraceLoggerStoreEntriesRoutedMessage::TraceLoggerStoreEntriesRoutedMessage(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RoutedMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("entries", entries_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TraceLoggerStoreEntriesRoutedMessage::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("entries", entries_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerRecords.h"
@@ -24,7 +25,8 @@ public:
     const std::optional<std::vector<TraceEntry>>& Entries() const { return entries_; }
     // Moves the entries out, for a sender that reuses their storage.
     std::vector<TraceEntry> TakeEntries() {
-        std::vector<TraceEntry> entries = entries_ ? std::move(*entries_) : std::vector<TraceEntry>();
+        std::vector<TraceEntry> entries =
+            entries_ ? std::move(*entries_) : std::vector<TraceEntry>();
         entries_.reset();
         return entries;
     }
@@ -32,6 +34,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("entries", self.entries_);
+    }
+
     std::optional<std::vector<TraceEntry>> entries_;
 };
 

@@ -3,8 +3,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/tracelogger/TraceLoggerService.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
@@ -15,12 +14,11 @@ TraceLoggerTracePointListRequest::TraceLoggerTracePointListRequest()
 TraceLoggerTracePointListRequest::TraceLoggerTracePointListRequest(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::RequestMessage(std::move(headers)) {
-    // No fields, but the body must still be JSON.
-    ParseJsonBody(body.ToString(), MessageType());
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TraceLoggerTracePointListRequest::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -3,6 +3,7 @@
 #include <string>
 
 #include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/RequestMessage.h"
 
@@ -19,6 +20,11 @@ public:
                                      const MessageBus::MessageBody& body);
 
     MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self&, Fields&) {}
 };
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

@@ -4,8 +4,7 @@
 #include <utility>
 
 #include "messagelibrary/ContentTypes.h"
-#include "messagelibrary/json/JsonReaders.h"
-#include "messagelibrary/json/JsonWriters.h"
+#include "messagelibrary/MessageFields.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages {
 
@@ -26,12 +25,11 @@ TraceLoggerTracePointListResponse::TraceLoggerTracePointListResponse(
 TraceLoggerTracePointListResponse::TraceLoggerTracePointListResponse(
     MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
     : MessageBus::ResponseMessage(std::move(headers)) {
-    const JsonVariant json = ParseJsonBody(body.ToString(), MessageType());
-    JsonBodyReader(json).Field("settings", settings_);
+    ReadMessageFields(*this, body);
 }
 
 MessageBus::MessageBody TraceLoggerTracePointListResponse::Serialize() const {
-    return MessageBus::MessageBody(JsonBodyWriter().Field("settings", settings_).Finish());
+    return WriteMessageFields(*this);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary::TraceLoggerMessages

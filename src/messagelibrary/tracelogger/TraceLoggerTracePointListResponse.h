@@ -7,6 +7,7 @@
 #include "messagebus/interfaces/IRoutingSource.h"
 #include "messagelibrary/MessageBody.h"
 #include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageFields.h"
 #include "messagelibrary/MessageHeaders.h"
 #include "messagelibrary/ResponseMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerRecords.h"
@@ -32,6 +33,12 @@ public:
     MessageBus::MessageBody Serialize() const override;
 
 private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("settings", self.settings_);
+    }
+
     std::optional<std::vector<TracePointSetting>> settings_;
 };
 

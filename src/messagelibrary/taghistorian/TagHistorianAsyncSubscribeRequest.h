@@ -1,0 +1,38 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+#include "messagelibrary/json/JsonReaders.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages {
+
+// Asks to be told of values stored for tags under the search paths.
+class TagHistorianAsyncSubscribeRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "TagHistorianAsyncSubscribeRequest";
+
+    explicit TagHistorianAsyncSubscribeRequest(std::optional<JsonStringList> searchPaths);
+    // Parses a received body.
+    TagHistorianAsyncSubscribeRequest(MessageBus::MessageHeaders headers,
+                                      const MessageBus::MessageBody& body);
+
+    const std::optional<JsonStringList>& SearchPaths() const { return searchPaths_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("searchPaths", self.searchPaths_);
+    }
+
+    std::optional<JsonStringList> searchPaths_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagebus/interfaces/IRoutingSource.h"
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageError.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/ResponseMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages {
+
+// Confirms a subscription to stored values.
+class TagHistorianAsyncSubscribeResponse : public MessageBus::ResponseMessage {
+public:
+    inline static const std::string kMessageName = "TagHistorianAsyncSubscribeResponse";
+
+    explicit TagHistorianAsyncSubscribeResponse(
+        const MessageBus::Interfaces::IRoutingSource& request);
+    // An error response.
+    TagHistorianAsyncSubscribeResponse(const MessageBus::Interfaces::IRoutingSource& request,
+                                       const MessageBus::MessageError& error);
+    // Parses a received body.
+    TagHistorianAsyncSubscribeResponse(MessageBus::MessageHeaders headers,
+                                       const MessageBus::MessageBody& body);
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self&, Fields&) {}
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages

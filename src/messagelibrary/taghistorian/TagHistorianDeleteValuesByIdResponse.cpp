@@ -1,0 +1,32 @@
+#include "messagelibrary/taghistorian/TagHistorianDeleteValuesByIdResponse.h"
+
+#include <utility>
+
+#include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages {
+
+TagHistorianDeleteValuesByIdResponse::TagHistorianDeleteValuesByIdResponse(
+    const MessageBus::Interfaces::IRoutingSource& request)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()) {
+    AnswerTo(request, std::nullopt);
+}
+
+TagHistorianDeleteValuesByIdResponse::TagHistorianDeleteValuesByIdResponse(
+    const MessageBus::Interfaces::IRoutingSource& request, const MessageBus::MessageError& error)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()) {
+    AnswerTo(request, error);
+}
+
+TagHistorianDeleteValuesByIdResponse::TagHistorianDeleteValuesByIdResponse(
+    MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body)
+    : MessageBus::ResponseMessage(std::move(headers)) {
+    ReadMessageFields(*this, body);
+}
+
+MessageBus::MessageBody TagHistorianDeleteValuesByIdResponse::Serialize() const {
+    return WriteMessageFields(*this);
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagHistorianMessages

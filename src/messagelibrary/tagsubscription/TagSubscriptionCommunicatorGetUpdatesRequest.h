@@ -1,0 +1,39 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+#include "messagelibrary/json/JsonReaders.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagSubscriptionCommunicatorMessages {
+
+// Polls the updates of subscriptions.
+class TagSubscriptionCommunicatorGetUpdatesRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "TagSubscriptionCommunicatorGetUpdatesRequest";
+
+    explicit TagSubscriptionCommunicatorGetUpdatesRequest(
+        std::optional<JsonStringList> subscriptionIds);
+    // Parses a received body.
+    TagSubscriptionCommunicatorGetUpdatesRequest(MessageBus::MessageHeaders headers,
+                                                 const MessageBus::MessageBody& body);
+
+    const std::optional<JsonStringList>& SubscriptionIds() const { return subscriptionIds_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("subscriptionIds", self.subscriptionIds_);
+    }
+
+    std::optional<JsonStringList> subscriptionIds_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagSubscriptionCommunicatorMessages

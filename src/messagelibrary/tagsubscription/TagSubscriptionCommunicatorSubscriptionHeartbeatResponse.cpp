@@ -1,0 +1,40 @@
+#include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscriptionHeartbeatResponse.h"
+
+#include <optional>
+#include <utility>
+
+#include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::TagSubscriptionCommunicatorMessages {
+
+TagSubscriptionCommunicatorSubscriptionHeartbeatResponse::
+    TagSubscriptionCommunicatorSubscriptionHeartbeatResponse(
+        const MessageBus::Interfaces::IRoutingSource& request,
+        std::optional<JsonStringList> invalidSubscriptionIds)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()),
+      invalidSubscriptionIds_(std::move(invalidSubscriptionIds)) {
+    AnswerTo(request, std::nullopt);
+}
+
+TagSubscriptionCommunicatorSubscriptionHeartbeatResponse::
+    TagSubscriptionCommunicatorSubscriptionHeartbeatResponse(
+        const MessageBus::Interfaces::IRoutingSource& request,
+        const MessageBus::MessageError& error)
+    : MessageBus::ResponseMessage(kMessageName, MessageBus::kJsonContentType, request.ReplyTo()) {
+    AnswerTo(request, error);
+}
+
+TagSubscriptionCommunicatorSubscriptionHeartbeatResponse::
+    TagSubscriptionCommunicatorSubscriptionHeartbeatResponse(MessageBus::MessageHeaders headers,
+                                                             const MessageBus::MessageBody& body)
+    : MessageBus::ResponseMessage(std::move(headers)) {
+    ReadMessageFields(*this, body);
+}
+
+MessageBus::MessageBody TagSubscriptionCommunicatorSubscriptionHeartbeatResponse::Serialize()
+    const {
+    return WriteMessageFields(*this);
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::TagSubscriptionCommunicatorMessages
