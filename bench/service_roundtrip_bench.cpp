@@ -1,5 +1,8 @@
 // Round trip of a small request answered by a minimal responder, through
-// MessageService and directly on rabbitmq-c, on the private test broker.
+// MessageService and directly on rabbitmq-c, on the private test broker. The
+// raw baseline runs twice: with the same properties and header table as
+// MessageService puts on the wire (the baseline of the ratios' targets), and
+// with a minimal message, which shows what the header table costs the broker.
 //
 //   tests/integration/broker/broker.sh start /tmp/broker.env
 //   KVVELDRA_BROKER_ENV=/tmp/broker.env build/bench/service_roundtrip_bench
@@ -27,6 +30,8 @@
 #include <vector>
 
 #include "messagebus/amqp/AmqpConnectionManager.h"
+#include "messagebus/amqp/AmqpPropertiesC.h"
+#include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagebus/concurrency/Semaphore.h"
 #include "messagebus/service/MessageService.h"
 #include "messagelibrary/RequestMessage.h"
@@ -104,12 +109,17 @@ public:
         Check(amqp_get_rpc_reply(state_), "basic.consume");
     }
 
+    // With base, its properties go out (header table included), with this
+    // correlation id and reply-to; without, only content type, correlation id
+    // and reply-to.
     void Publish(const std::string& exchange, const std::string& key,
-                 const std::string& correlationId, const std::string& replyTo) {
+                 const std::string& correlationId, const std::string& replyTo,
+                 const amqp_basic_properties_t* base = nullptr) {
         amqp_basic_properties_t properties{};
-        properties._flags = AMQP_BASIC_CONTENT_TYPE_FLAG | AMQP_BASIC_CORRELATION_ID_FLAG |
-                            AMQP_BASIC_REPLY_TO_FLAG;
-        properties.content_type = amqp_cstring_bytes("application/json");
+        if (base != nullptr) properties = *base;
+        properties._flags |= AMQP_BASIC_CONTENT_TYPE_FLAG | AMQP_BASIC_CORRELATION_ID_FLAG |
+                             AMQP_BASIC_REPLY_TO_FLAG;
+        if (base == nullptr) properties.content_type = amqp_cstring_bytes("application/json");
         properties.correlation_id = amqp_cstring_bytes(correlationId.c_str());
         properties.reply_to = amqp_cstring_bytes(replyTo.c_str());
         if (amqp_basic_publish(state_, 1, amqp_cstring_bytes(exchange.c_str()),
@@ -154,14 +164,17 @@ void RunUntil(const std::atomic<bool>& stop, Step step) {
 // Answers every request on its queue to the request's reply_to key.
 class RawResponder {
 public:
-    RawResponder(const BrokerAddress& broker, const std::string& exchange, const std::string& key)
+    // With wire, the answers carry the library's properties too.
+    RawResponder(const BrokerAddress& broker, const std::string& exchange, const std::string& key,
+                 const amqp_basic_properties_t* wire = nullptr)
         : connection_(broker), exchange_(exchange) {
         connection_.Listen(exchange, key, key);
-        thread_ = std::thread([this] {
+        thread_ = std::thread([this, wire] {
             Delivery request;
             RunUntil(stop_, [&] {
                 if (connection_.Next(request, 100)) {
-                    connection_.Publish(exchange_, request.replyTo, request.correlationId, "");
+                    connection_.Publish(exchange_, request.replyTo, request.correlationId, "",
+                                        wire);
                 }
             });
         });
@@ -186,6 +199,39 @@ public:
         : RequestMessage("BenchRequest", "application/json", target) {}
     Bus::MessageBody Serialize() const override { return Bus::MessageBody(std::string("{}")); }
 };
+
+// The properties MessageService puts on a request (type, time, identity,
+// reply-to, origin, the header table), so that the raw baseline can carry the
+// same bytes on the wire.
+class LibraryWire {
+public:
+    LibraryWire() {
+        BenchRequest request("bench.raw.server");
+        request.Headers().SetReplyTo("bench_client");
+        request.Headers().SetOrigin("bench_client");
+        request.EnsureIdentity();
+        record_ = Bus::ToAmqpProperties(request.Headers());
+        properties_ = std::make_unique<Bus::AmqpBasicProperties>(record_);
+    }
+    LibraryWire(const LibraryWire&) = delete;
+    LibraryWire& operator=(const LibraryWire&) = delete;
+    const amqp_basic_properties_t* Get() const { return properties_->Get(); }
+
+private:
+    Bus::AmqpProperties record_;
+    std::unique_ptr<Bus::AmqpBasicProperties> properties_;  // points into record_
+};
+
+// Null for the minimal message (argument 0), else the library's properties.
+const amqp_basic_properties_t* WireOf(const benchmark::State& state) {
+    static const LibraryWire wire;
+    return state.range(0) == 0 ? nullptr : wire.Get();
+}
+
+// The figures' name of a raw run.
+std::string RawName(const benchmark::State& state, const char* base) {
+    return std::string(base) + (state.range(0) == 0 ? "_minimal" : "");
+}
 
 // Answers every "BenchRequest" with a GenericResponse.
 class ServiceResponder : public Bus::Interfaces::IBroadcastCallback {
@@ -265,13 +311,14 @@ void MeasureSequential(benchmark::State& state, const char* name, RoundTrip roun
 void BM_RoundTripRaw(benchmark::State& state) {
     const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.server." + g_tag;
     const std::string reply = "bench.raw.client." + g_tag;
-    RawResponder responder(*g_broker, exchange, server);
+    const amqp_basic_properties_t* wire = WireOf(state);
+    RawResponder responder(*g_broker, exchange, server, wire);
     RawConnection client(*g_broker);
     client.Listen(exchange, reply, reply);
     int next = 0;
-    MeasureSequential(state, "raw", [&] {
+    MeasureSequential(state, RawName(state, "raw").c_str(), [&] {
         const std::string id = std::to_string(next++);
-        client.Publish(exchange, server, id, reply);
+        client.Publish(exchange, server, id, reply, wire);
         Delivery response;
         while (client.Next(response, kReplyTimeoutMs)) {
             if (response.correlationId == id) return true;
@@ -346,8 +393,9 @@ void ReportPipeline(benchmark::State& state, const char* name, double perSecond)
 void BM_PipelinedRaw(benchmark::State& state) {
     const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.pserver." + g_tag;
     const std::string reply = "bench.raw.pclient." + g_tag;
+    const amqp_basic_properties_t* wire = WireOf(state);
     for (auto _ : state) {
-        RawResponder responder(*g_broker, exchange, server);
+        RawResponder responder(*g_broker, exchange, server, wire);
         RawConnection publisher(*g_broker), consumer(*g_broker);
         consumer.Listen(exchange, reply, reply);
         Pipeline pipeline;
@@ -364,11 +412,11 @@ void BM_PipelinedRaw(benchmark::State& state) {
         const double perSecond = pipeline.Run([&](int thread, int index) {
             const std::string id = std::to_string(thread) + "-" + std::to_string(index);
             std::lock_guard<std::mutex> lock(publishMutex);
-            publisher.Publish(exchange, server, id, reply);
+            publisher.Publish(exchange, server, id, reply, wire);
         });
         stop = true;
         reader.join();
-        ReportPipeline(state, "raw_pipelined", perSecond);
+        ReportPipeline(state, RawName(state, "raw_pipelined").c_str(), perSecond);
     }
 }
 
@@ -399,9 +447,11 @@ void BM_PipelinedService(benchmark::State& state) {
     }
 }
 
-BENCHMARK(BM_RoundTripRaw)->Iterations(kSequentialRoundTrips)->UseRealTime();
+// Raw runs: argument 0 sends a minimal message (content type, correlation id,
+// reply-to, "{}"), 1 the same properties and header table as MessageService.
+BENCHMARK(BM_RoundTripRaw)->Arg(0)->Arg(1)->Iterations(kSequentialRoundTrips)->UseRealTime();
 BENCHMARK(BM_RoundTripService)->Iterations(kSequentialRoundTrips)->UseRealTime();
-BENCHMARK(BM_PipelinedRaw)->Iterations(1)->UseRealTime();
+BENCHMARK(BM_PipelinedRaw)->Arg(0)->Arg(1)->Iterations(1)->UseRealTime();
 BENCHMARK(BM_PipelinedService)->Iterations(1)->UseRealTime();
 
 void PrintRatios() {
@@ -414,6 +464,13 @@ void PrintRatios() {
     PrintRatio("pipelined requests/s, SendRequestAsync / raw",
                g_figures["service_pipelined"].perSecond, g_figures["raw_pipelined"].perSecond,
                ">= 0.9");
+    // The same against a raw message without the library's header table.
+    const Figures minimal = g_figures["raw_minimal"];
+    PrintRatio("round trip p50, MessageService / raw minimal message", service.p50Us,
+               minimal.p50Us, "-");
+    PrintRatio("pipelined requests/s, SendRequestAsync / raw minimal message",
+               g_figures["service_pipelined"].perSecond,
+               g_figures["raw_pipelined_minimal"].perSecond, "-");
 }
 
 }  // namespace

@@ -249,8 +249,10 @@ bool ReadJsonValue(std::map<std::string, T>& out, const JsonVariant* value) {
     out.clear();
     if (value == nullptr || value->IsNull()) return true;
     if (!value->IsObject()) return false;
+    // Members come in key order: each goes in at the end.
     for (const JsonMember& member : value->Members()) {
-        if (!ReadJsonValue(out[member.key], &member.value)) return false;
+        const auto slot = out.emplace_hint(out.end(), member.key.ToString(), T{});
+        if (!ReadJsonValue(slot->second, &member.value)) return false;
     }
     return true;
 }
