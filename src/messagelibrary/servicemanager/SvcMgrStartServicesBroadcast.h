@@ -12,8 +12,8 @@
 
 namespace Korvane::Veldra::VeldraMessageLibrary::ServiceManagerMessages {
 
-// Starts services on nodes. A flag set to all stands before the list it
-// overrides.
+// Starts instances of services on nodes. allNodes and allServices, each
+// written before its list, stand for every node or every service.
 class SvcMgrStartServicesBroadcast : public MessageBus::BroadcastMessage {
 public:
     inline static const std::string kMessageName = "SvcMgrStartServicesBroadcast";
