@@ -1,8 +1,8 @@
-// The parsing constructors of the tag, historian, subscription, selection and
-// trace logger messages. The first byte picks the class, the rest is the body.
-// A body either parses or is refused with VeldraException (or the conversion
-// failure of a numeric text); what parses is written, and when that text
-// parses again it must be written with the same bytes.
+// The parsing constructors of the tag, historian, subscription, selection,
+// trace logger and service control messages. The first byte picks the class,
+// the rest is the body. A body either parses or is refused with VeldraException
+// (or the conversion failure of a numeric text); what parses is written, and
+// when that text parses again it must be written with the same bytes.
 
 #include <boost/lexical_cast.hpp>
 #include <cstddef>
@@ -12,6 +12,34 @@
 #include <utility>
 
 #include "errors/VeldraException.h"
+#include "messagelibrary/service/ServiceGoLiveRoutedMessage.h"
+#include "messagelibrary/service/ServiceMakeIdleRoutedMessage.h"
+#include "messagelibrary/service/ServiceShutdownRoutedMessage.h"
+#include "messagelibrary/service/ServiceStartedBroadcast.h"
+#include "messagelibrary/service/ServiceStatusBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrConsoleWriteLineBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrGetActorTreeRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrGetActorTreeResponse.h"
+#include "messagelibrary/servicemanager/SvcMgrGetServiceGroupsRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrGetServiceGroupsResponse.h"
+#include "messagelibrary/servicemanager/SvcMgrGetServiceInfoSnapshotRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrGetServiceInfoSnapshotResponse.h"
+#include "messagelibrary/servicemanager/SvcMgrHeartbeatBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrPurgeStoppedServicesRequestBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrRegisterLocalServiceRoutedMessage.h"
+#include "messagelibrary/servicemanager/SvcMgrReportServicesRequestBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrReportServicesResponseBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrRunningServiceManagersRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrRunningServiceManagersResponse.h"
+#include "messagelibrary/servicemanager/SvcMgrSendServiceStatusRequestBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrServiceHasShutdownBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrStartServicesBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrStopMultipleServicesBroadcast.h"
+#include "messagelibrary/servicemanager/SvcMgrStopOneServiceRoutedMessage.h"
+#include "messagelibrary/servicemanager/SvcMgrUnavailableLocalServiceRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrUnavailableLocalServiceResponse.h"
+#include "messagelibrary/servicemanager/SvcMgrUpdateServiceGroupRequest.h"
+#include "messagelibrary/servicemanager/SvcMgrUpdateServiceGroupResponse.h"
 #include "messagelibrary/tagcurrentvalue/TagCvAggregatesResetBroadcast.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
@@ -170,6 +198,34 @@ constexpr Parser kParsers[] = {
     ParseAs<TagHttpMessages::TagHttpGetSelectionsRequest>,
     ParseAs<TagHttpMessages::TagHttpGetSelectionsResponse>,
     ParseAs<TagHttpMessages::TagHttpUpdateSelectionRoutedMessage>,
+    ParseAs<ServiceMessages::ServiceGoLiveRoutedMessage>,
+    ParseAs<ServiceMessages::ServiceMakeIdleRoutedMessage>,
+    ParseAs<ServiceMessages::ServiceShutdownRoutedMessage>,
+    ParseAs<ServiceMessages::ServiceStartedBroadcast>,
+    ParseAs<ServiceMessages::ServiceStatusBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrConsoleWriteLineBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetActorTreeRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetActorTreeResponse>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetServiceGroupsRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetServiceGroupsResponse>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetServiceInfoSnapshotRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrGetServiceInfoSnapshotResponse>,
+    ParseAs<ServiceManagerMessages::SvcMgrHeartbeatBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrPurgeStoppedServicesRequestBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrRegisterLocalServiceRoutedMessage>,
+    ParseAs<ServiceManagerMessages::SvcMgrReportServicesRequestBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrReportServicesResponseBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrRunningServiceManagersRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrRunningServiceManagersResponse>,
+    ParseAs<ServiceManagerMessages::SvcMgrSendServiceStatusRequestBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrServiceHasShutdownBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrStartServicesBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrStopMultipleServicesBroadcast>,
+    ParseAs<ServiceManagerMessages::SvcMgrStopOneServiceRoutedMessage>,
+    ParseAs<ServiceManagerMessages::SvcMgrUnavailableLocalServiceRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrUnavailableLocalServiceResponse>,
+    ParseAs<ServiceManagerMessages::SvcMgrUpdateServiceGroupRequest>,
+    ParseAs<ServiceManagerMessages::SvcMgrUpdateServiceGroupResponse>,
 };
 constexpr std::size_t kParserCount = sizeof(kParsers) / sizeof(kParsers[0]);
 
