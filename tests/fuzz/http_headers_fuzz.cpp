@@ -23,6 +23,7 @@ namespace {
 using namespace Korvane::Veldra::VeldraMessageLibrary::HttpMessages;
 using Korvane::Veldra::MessageBus::MessageBody;
 using Korvane::Veldra::MessageBus::MessageHeaders;
+using Korvane::Veldra::MessageBus::VeldraException;
 
 // Fills the headers named by keys from the lines of input and returns the rest.
 std::string_view TakeHeaders(std::string_view input, const std::vector<std::string_view>& keys,
