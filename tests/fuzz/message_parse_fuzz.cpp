@@ -1,8 +1,8 @@
-// The parsing constructors of the tag, historian, subscription, selection,
-// trace logger and service control messages. The first byte picks the class,
-// the rest is the body. A body either parses or is refused with VeldraException
-// (or the conversion failure of a numeric text); what parses is written, and
-// when that text parses again it must be written with the same bytes.
+// The parsing constructors of the JSON messages. The first
+// byte picks the class, the rest is the body. A body either parses or is
+// refused with VeldraException (or the conversion failure of a numeric text);
+// what parses is written, and when that text parses again it must be written
+// with the same bytes.
 
 #include <boost/lexical_cast.hpp>
 #include <cstddef>
@@ -12,6 +12,27 @@
 #include <utility>
 
 #include "errors/VeldraException.h"
+#include "messagelibrary/audit/AuditAddRoutedMessage.h"
+#include "messagelibrary/audit/AuditDeleteRoutedMessage.h"
+#include "messagelibrary/audit/AuditQueryRequest.h"
+#include "messagelibrary/audit/AuditQueryResponse.h"
+#include "messagelibrary/audit/AuditTypeAddRoutedMessage.h"
+#include "messagelibrary/audit/AuditTypeDeleteRequest.h"
+#include "messagelibrary/audit/AuditTypeDeleteResponse.h"
+#include "messagelibrary/audit/AuditTypeListRequest.h"
+#include "messagelibrary/audit/AuditTypeListResponse.h"
+#include "messagelibrary/configuration/ConfigurationGetKeysRequest.h"
+#include "messagelibrary/configuration/ConfigurationGetKeysResponse.h"
+#include "messagelibrary/configuration/ConfigurationGetSectionKeyValuesRequest.h"
+#include "messagelibrary/configuration/ConfigurationGetSectionKeyValuesResponse.h"
+#include "messagelibrary/configuration/ConfigurationGetSectionsRequest.h"
+#include "messagelibrary/configuration/ConfigurationGetSectionsResponse.h"
+#include "messagelibrary/configuration/ConfigurationGetValueRequest.h"
+#include "messagelibrary/configuration/ConfigurationGetValueResponse.h"
+#include "messagelibrary/configuration/ConfigurationSetKeysRequest.h"
+#include "messagelibrary/configuration/ConfigurationSetKeysResponse.h"
+#include "messagelibrary/configuration/ConfigurationSetValueRequest.h"
+#include "messagelibrary/configuration/ConfigurationSetValueResponse.h"
 #include "messagelibrary/service/ServiceGoLiveRoutedMessage.h"
 #include "messagelibrary/service/ServiceMakeIdleRoutedMessage.h"
 #include "messagelibrary/service/ServiceShutdownRoutedMessage.h"
@@ -40,6 +61,25 @@
 #include "messagelibrary/servicemanager/SvcMgrUnavailableLocalServiceResponse.h"
 #include "messagelibrary/servicemanager/SvcMgrUpdateServiceGroupRequest.h"
 #include "messagelibrary/servicemanager/SvcMgrUpdateServiceGroupResponse.h"
+#include "messagelibrary/smtp/SmtpDeleteAddressGroupRequest.h"
+#include "messagelibrary/smtp/SmtpDeleteAddressGroupResponse.h"
+#include "messagelibrary/smtp/SmtpDeleteTemplateRequest.h"
+#include "messagelibrary/smtp/SmtpDeleteTemplateResponse.h"
+#include "messagelibrary/smtp/SmtpGetAddressGroupRequest.h"
+#include "messagelibrary/smtp/SmtpGetAddressGroupResponse.h"
+#include "messagelibrary/smtp/SmtpGetAddressGroupsRequest.h"
+#include "messagelibrary/smtp/SmtpGetAddressGroupsResponse.h"
+#include "messagelibrary/smtp/SmtpGetTemplateListItemsRequest.h"
+#include "messagelibrary/smtp/SmtpGetTemplateListItemsResponse.h"
+#include "messagelibrary/smtp/SmtpGetTemplateRequest.h"
+#include "messagelibrary/smtp/SmtpGetTemplateResponse.h"
+#include "messagelibrary/smtp/SmtpPublishedEmailBroadcast.h"
+#include "messagelibrary/smtp/SmtpSendEmailToAddressGroupRoutedMessage.h"
+#include "messagelibrary/smtp/SmtpSendTemplatedEmailToAddressGroupsRoutedMessage.h"
+#include "messagelibrary/smtp/SmtpUpdateOrCreateAddressGroupRequest.h"
+#include "messagelibrary/smtp/SmtpUpdateOrCreateAddressGroupResponse.h"
+#include "messagelibrary/smtp/SmtpUpdateOrCreateTemplateRequest.h"
+#include "messagelibrary/smtp/SmtpUpdateOrCreateTemplateResponse.h"
 #include "messagelibrary/tagcurrentvalue/TagCvAggregatesResetBroadcast.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathRequest.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
@@ -99,6 +139,9 @@
 #include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorSubscriptionHeartbeatResponse.h"
 #include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorUnsubscribeRequest.h"
 #include "messagelibrary/tagsubscription/TagSubscriptionCommunicatorUnsubscribeResponse.h"
+#include "messagelibrary/timer/TimerCallbackResponseRoutedMessage.h"
+#include "messagelibrary/timer/TimerRegisterCallbackRoutedMessage.h"
+#include "messagelibrary/timer/TimerUnregisterCallbackRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandRequest.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandResponse.h"
@@ -107,6 +150,14 @@
 #include "messagelibrary/tracelogger/TraceLoggerStoreEntriesRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerTracePointListRequest.h"
 #include "messagelibrary/tracelogger/TraceLoggerTracePointListResponse.h"
+#include "messagelibrary/workflow/WorkflowDecisionMadeRequest.h"
+#include "messagelibrary/workflow/WorkflowDecisionMadeResponse.h"
+#include "messagelibrary/workflow/WorkflowOfferToDecideRequest.h"
+#include "messagelibrary/workflow/WorkflowOfferToDecideResponse.h"
+#include "messagelibrary/workflow/WorkflowOfferToWorkRequest.h"
+#include "messagelibrary/workflow/WorkflowOfferToWorkResponse.h"
+#include "messagelibrary/workflow/WorkflowWorkCompleteRequest.h"
+#include "messagelibrary/workflow/WorkflowWorkCompleteResponse.h"
 
 namespace {
 
@@ -226,6 +277,57 @@ constexpr Parser kParsers[] = {
     ParseAs<ServiceManagerMessages::SvcMgrUnavailableLocalServiceResponse>,
     ParseAs<ServiceManagerMessages::SvcMgrUpdateServiceGroupRequest>,
     ParseAs<ServiceManagerMessages::SvcMgrUpdateServiceGroupResponse>,
+    ParseAs<AuditTrailMessages::AuditAddRoutedMessage>,
+    ParseAs<AuditTrailMessages::AuditDeleteRoutedMessage>,
+    ParseAs<AuditTrailMessages::AuditQueryRequest>,
+    ParseAs<AuditTrailMessages::AuditQueryResponse>,
+    ParseAs<AuditTrailMessages::AuditTypeAddRoutedMessage>,
+    ParseAs<AuditTrailMessages::AuditTypeDeleteRequest>,
+    ParseAs<AuditTrailMessages::AuditTypeDeleteResponse>,
+    ParseAs<AuditTrailMessages::AuditTypeListRequest>,
+    ParseAs<AuditTrailMessages::AuditTypeListResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationGetKeysRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationGetKeysResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationGetSectionKeyValuesRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationGetSectionKeyValuesResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationGetSectionsRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationGetSectionsResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationGetValueRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationGetValueResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationSetKeysRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationSetKeysResponse>,
+    ParseAs<ConfigurationMessages::ConfigurationSetValueRequest>,
+    ParseAs<ConfigurationMessages::ConfigurationSetValueResponse>,
+    ParseAs<SmtpMessages::SmtpDeleteAddressGroupRequest>,
+    ParseAs<SmtpMessages::SmtpDeleteAddressGroupResponse>,
+    ParseAs<SmtpMessages::SmtpDeleteTemplateRequest>,
+    ParseAs<SmtpMessages::SmtpDeleteTemplateResponse>,
+    ParseAs<SmtpMessages::SmtpGetAddressGroupRequest>,
+    ParseAs<SmtpMessages::SmtpGetAddressGroupResponse>,
+    ParseAs<SmtpMessages::SmtpGetAddressGroupsRequest>,
+    ParseAs<SmtpMessages::SmtpGetAddressGroupsResponse>,
+    ParseAs<SmtpMessages::SmtpGetTemplateListItemsRequest>,
+    ParseAs<SmtpMessages::SmtpGetTemplateListItemsResponse>,
+    ParseAs<SmtpMessages::SmtpGetTemplateRequest>,
+    ParseAs<SmtpMessages::SmtpGetTemplateResponse>,
+    ParseAs<SmtpMessages::SmtpPublishedEmailBroadcast>,
+    ParseAs<SmtpMessages::SmtpSendEmailToAddressGroupRoutedMessage>,
+    ParseAs<SmtpMessages::SmtpSendTemplatedEmailToAddressGroupsRoutedMessage>,
+    ParseAs<SmtpMessages::SmtpUpdateOrCreateAddressGroupRequest>,
+    ParseAs<SmtpMessages::SmtpUpdateOrCreateAddressGroupResponse>,
+    ParseAs<SmtpMessages::SmtpUpdateOrCreateTemplateRequest>,
+    ParseAs<SmtpMessages::SmtpUpdateOrCreateTemplateResponse>,
+    ParseAs<TimerMessages::TimerCallbackResponseRoutedMessage>,
+    ParseAs<TimerMessages::TimerRegisterCallbackRoutedMessage>,
+    ParseAs<TimerMessages::TimerUnregisterCallbackRoutedMessage>,
+    ParseAs<WorkflowMessages::WorkflowDecisionMadeRequest>,
+    ParseAs<WorkflowMessages::WorkflowDecisionMadeResponse>,
+    ParseAs<WorkflowMessages::WorkflowOfferToDecideRequest>,
+    ParseAs<WorkflowMessages::WorkflowOfferToDecideResponse>,
+    ParseAs<WorkflowMessages::WorkflowOfferToWorkRequest>,
+    ParseAs<WorkflowMessages::WorkflowOfferToWorkResponse>,
+    ParseAs<WorkflowMessages::WorkflowWorkCompleteRequest>,
+    ParseAs<WorkflowMessages::WorkflowWorkCompleteResponse>,
 };
 constexpr std::size_t kParserCount = sizeof(kParsers) / sizeof(kParsers[0]);
 

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::AuditTrailMessages {
+
+// Asks for the types of audit entry.
+class AuditTypeListRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "AuditTypeListRequest";
+
+    AuditTypeListRequest();
+    // Parses a received body.
+    AuditTypeListRequest(MessageBus::MessageHeaders headers, const MessageBus::MessageBody& body);
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self&, Fields&) {}
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::AuditTrailMessages

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages {
+
+// Asks to delete an e-mail template by its id.
+class SmtpDeleteTemplateRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "SmtpDeleteTemplateRequest";
+
+    explicit SmtpDeleteTemplateRequest(std::optional<std::string> id);
+    // Parses a received body.
+    SmtpDeleteTemplateRequest(MessageBus::MessageHeaders headers,
+                              const MessageBus::MessageBody& body);
+
+    const std::optional<std::string>& Id() const { return id_; }
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("id", self.id_);
+    }
+
+    std::optional<std::string> id_;
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages

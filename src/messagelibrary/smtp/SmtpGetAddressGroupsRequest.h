@@ -1,0 +1,30 @@
+#pragma once
+
+#include <string>
+
+#include "messagelibrary/MessageBody.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/MessageHeaders.h"
+#include "messagelibrary/RequestMessage.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages {
+
+// Asks for all address groups.
+class SmtpGetAddressGroupsRequest : public MessageBus::RequestMessage {
+public:
+    inline static const std::string kMessageName = "SmtpGetAddressGroupsRequest";
+
+    SmtpGetAddressGroupsRequest();
+    // Parses a received body.
+    SmtpGetAddressGroupsRequest(MessageBus::MessageHeaders headers,
+                                const MessageBus::MessageBody& body);
+
+    MessageBus::MessageBody Serialize() const override;
+
+private:
+    friend struct VeldraMessageLibrary::JsonFieldAccess;
+    template <typename Self, typename Fields>
+    static void JsonFields(Self&, Fields&) {}
+};
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages

@@ -1,0 +1,25 @@
+#include "messagelibrary/smtp/SmtpGetTemplateRequest.h"
+
+#include <utility>
+
+#include "messagelibrary/ContentTypes.h"
+#include "messagelibrary/MessageFields.h"
+#include "messagelibrary/smtp/SmtpService.h"
+
+namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages {
+
+SmtpGetTemplateRequest::SmtpGetTemplateRequest(std::optional<std::string> id)
+    : MessageBus::RequestMessage(kMessageName, MessageBus::kJsonContentType, kSmtpService),
+      id_(std::move(id)) {}
+
+SmtpGetTemplateRequest::SmtpGetTemplateRequest(MessageBus::MessageHeaders headers,
+                                               const MessageBus::MessageBody& body)
+    : MessageBus::RequestMessage(std::move(headers)) {
+    ReadMessageFields(*this, body);
+}
+
+MessageBus::MessageBody SmtpGetTemplateRequest::Serialize() const {
+    return WriteMessageFields(*this);
+}
+
+}  // namespace Korvane::Veldra::VeldraMessageLibrary::SmtpMessages
