@@ -31,9 +31,9 @@
 
 #include "messagebus/amqp/AmqpConnectionManager.h"
 #include "messagebus/amqp/AmqpPropertiesC.h"
-#include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagebus/concurrency/Semaphore.h"
 #include "messagebus/service/MessageService.h"
+#include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/RequestMessage.h"
 #include "support/BenchBroker.h"
 #include "support/Ratios.h"
@@ -466,8 +466,8 @@ void PrintRatios() {
                ">= 0.9");
     // The same against a raw message without the library's header table.
     const Figures minimal = g_figures["raw_minimal"];
-    PrintRatio("round trip p50, MessageService / raw minimal message", service.p50Us,
-               minimal.p50Us, "-");
+    PrintRatio("round trip p50, MessageService / raw minimal message", service.p50Us, minimal.p50Us,
+               "-");
     PrintRatio("pipelined requests/s, SendRequestAsync / raw minimal message",
                g_figures["service_pipelined"].perSecond,
                g_figures["raw_pipelined_minimal"].perSecond, "-");

@@ -9,7 +9,8 @@ namespace {
 class CollectingReporter : public benchmark::ConsoleReporter {
 public:
     // Without colours: the ratio lines are read back from the output.
-    explicit CollectingReporter(RatioFigures& figures) : ConsoleReporter(OO_Tabular), figures_(figures) {}
+    explicit CollectingReporter(RatioFigures& figures)
+        : ConsoleReporter(OO_Tabular), figures_(figures) {}
 
     void ReportRuns(const std::vector<Run>& runs) override {
         ConsoleReporter::ReportRuns(runs);

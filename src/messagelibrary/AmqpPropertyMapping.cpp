@@ -1,6 +1,7 @@
 #include "messagelibrary/AmqpPropertyMapping.h"
 
 #include <ctime>
+#include <utility>
 
 #include "messagelibrary/HeaderKeys.h"
 
@@ -45,12 +46,13 @@ AmqpProperties ToAmqpProperties(const MessageHeaders& headers) {
     return ToAmqpProperties(headers, static_cast<int64_t>(std::time(nullptr)));
 }
 
-MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::string& routingKey,
+MessageHeaders HeadersFromAmqp(AmqpProperties properties, const std::string& routingKey,
                                const std::string& consumerTag, uint64_t deliveryTag) {
     using namespace AmqpPropertyFlags;
     MessageHeaders headers;
-    headers.messageType = FlaggedText(properties, kType, properties.type);
-    headers.contentType = FlaggedText(properties, kContentType, properties.contentType);
+    // The record is ours: its texts move over rather than being copied.
+    if (HasFlag(properties, kType)) headers.messageType = std::move(properties.type);
+    if (HasFlag(properties, kContentType)) headers.contentType = std::move(properties.contentType);
     headers.routingKey = routingKey;
     if (HasFlag(properties, kTimestamp)) {
         const auto seconds = static_cast<int32_t>(properties.timestamp / 1000u);
@@ -61,7 +63,10 @@ MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::stri
     headers.correlationId = correlationId.substr(0, correlationId.find('\0'));
 
     if (HasFlag(properties, kHeaders)) {
-        for (const auto& entry : properties.headers) headers.SetHeader(entry.key, entry.value);
+        // A repeated key keeps its last value.
+        for (auto& entry : properties.headers) {
+            headers.headers.insert_or_assign(std::move(entry.key), std::move(entry.value));
+        }
     }
     // The values computed here are written after the sender's table on
     // purpose: a message re-published with the headers it was received with

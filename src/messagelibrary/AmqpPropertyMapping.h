@@ -24,7 +24,7 @@ AmqpProperties ToAmqpProperties(const MessageHeaders& headers);
 // "Persistent" is "true" or "false" from the delivery mode, "ConsumerTag" is
 // the local consumer's tag and "DeliveryTag" the low 32 bits of the delivery
 // tag.
-MessageHeaders HeadersFromAmqp(const AmqpProperties& properties, const std::string& routingKey,
+MessageHeaders HeadersFromAmqp(AmqpProperties properties, const std::string& routingKey,
                                const std::string& consumerTag, uint64_t deliveryTag);
 
 }  // namespace Korvane::Veldra::MessageBus
