@@ -15,7 +15,8 @@ using MessageBus::MessageBody;
 using MessageBus::MessageHeaders;
 
 // Bytes that are no JSON, with a zero inside.
-const std::string kPayload("{\0\xff not json", 14);
+constexpr char kPayloadBytes[] = "{\0\xff not json";
+const std::string kPayload(kPayloadBytes, sizeof(kPayloadBytes) - 1);
 
 HttpRequest SampleRequest(std::optional<std::string> uri = std::string("/api/v1?x=1")) {
     HttpRequest request(HttpMethod::Post, std::move(uri), MessageBody(kPayload));
