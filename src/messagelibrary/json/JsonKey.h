@@ -10,7 +10,8 @@
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
 // The key of an object member, in 16 bytes: a key of up to 15 bytes stands in
-// place with its terminating zero, a longer one is on the heap. Keys are
+// place with its terminating zero, a longer one is on the heap (or, in a
+// parsed tree, in the tree's pool). Keys are
 // mostly short field names, so a parsed object costs no allocation for them,
 // and members move as plain bytes when an object is sorted.
 class JsonKey {
@@ -31,6 +32,17 @@ public:
         std::memcpy(bytes_ + sizeof(heap), &size, 7);  // little-endian: the low 7 bytes
         bytes_[kMarker] = kHeapMarker;
     }
+    // A key whose text, zero-terminated, lives elsewhere for as long as the
+    // key (a parsed tree's pool): it is not copied and not freed.
+    static JsonKey Borrowed(const char* text, std::size_t size) noexcept {
+        JsonKey key;
+        const uint64_t length = size;
+        std::memcpy(key.bytes_, &text, sizeof(text));
+        std::memcpy(key.bytes_ + sizeof(text), &length, 7);
+        key.bytes_[kMarker] = kBorrowedMarker;
+        return key;
+    }
+
     JsonKey(JsonKey&& other) noexcept {
         std::memcpy(bytes_, other.bytes_, sizeof(bytes_));
         other.Clear();
@@ -73,8 +85,12 @@ private:
     static constexpr std::size_t kInline = 15;
     static constexpr std::size_t kMarker = 15;  // 15 - length, or kHeapMarker
     static constexpr char kHeapMarker = static_cast<char>(0xFF);
+    static constexpr char kBorrowedMarker = static_cast<char>(0xFE);
 
-    bool IsHeap() const noexcept { return bytes_[kMarker] == kHeapMarker; }
+    // The text is elsewhere: on the heap (owned) or borrowed.
+    bool IsHeap() const noexcept {
+        return bytes_[kMarker] == kHeapMarker || bytes_[kMarker] == kBorrowedMarker;
+    }
     char* HeapText() const noexcept {
         char* heap;
         std::memcpy(&heap, bytes_, sizeof(heap));
@@ -85,12 +101,23 @@ private:
         bytes_[kMarker] = static_cast<char>(kInline);
     }
     void Free() noexcept {
-        if (IsHeap()) delete[] HeapText();
+        if (bytes_[kMarker] == kHeapMarker) delete[] HeapText();
     }
 
     char bytes_[16];
 };
 
 static_assert(sizeof(JsonKey) == 16, "a key is two words");
+
+// The order of keys: by bytes, then by length. Keys are short: a plain loop
+// beats a call to memcmp here.
+inline bool JsonKeyLess(std::string_view a, std::string_view b) noexcept {
+    const std::size_t common = a.size() < b.size() ? a.size() : b.size();
+    for (std::size_t i = 0; i < common; ++i) {
+        if (a[i] != b[i])
+            return static_cast<unsigned char>(a[i]) < static_cast<unsigned char>(b[i]);
+    }
+    return a.size() < b.size();
+}
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

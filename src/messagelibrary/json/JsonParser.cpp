@@ -2,11 +2,14 @@
 
 #include <cstring>
 #include <deque>
+#include <memory>
 #include <utility>
 #include <vector>
 
 #include "messagelibrary/json/JsonGrammar.h"
 #include "messagelibrary/json/JsonNumberText.h"
+#include "messagelibrary/json/JsonPool.h"
+#include "messagelibrary/json/JsonPooledTree.h"
 #include "messagelibrary/json/JsonUnescape.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
@@ -20,11 +23,18 @@ using Jsonz::JsonToken;
 // takes them over in one go, sized exactly.
 class TreeBuilder {
 public:
-    TreeBuilder() {
+    explicit TreeBuilder(std::size_t textLength) : pool_(std::make_unique<JsonPool>(textLength)) {
         values_.reserve(64);
         keys_.reserve(32);
         frames_.reserve(16);
     }
+    // Values left on the stack after a failure are nodes of the pool, which
+    // goes with the builder.
+    ~TreeBuilder() {
+        for (JsonVariant& value : values_) JsonPooledTree::Forget(value);
+    }
+    TreeBuilder(const TreeBuilder&) = delete;
+    TreeBuilder& operator=(const TreeBuilder&) = delete;
 
     void Null() { values_.emplace_back(JsonKind::Null); }
     void Bool(bool value) { values_.emplace_back(value); }
@@ -35,7 +45,9 @@ public:
         if (!Jsonz::ConvertJsonDouble(token.start, token.length, value)) failed_ = true;
         values_.emplace_back(value);
     }
-    void String(const JsonToken& token) { values_.emplace_back(Decode(token)); }
+    void String(const JsonToken& token) {
+        values_.push_back(JsonPooledTree::String(*pool_, Decode(token)));
+    }
     // A key without escapes is kept as a view of the document; a decoded one
     // gets storage that stays put until the parse ends.
     void Key(const JsonToken& token) {
@@ -51,30 +63,32 @@ public:
     void EndObject() {
         const Frame frame = frames_.back();
         frames_.pop_back();
-        JsonObjectBuilder object;
-        object.Reserve(values_.size() - frame.firstValue);
+        members_.clear();
         for (std::size_t i = frame.firstValue, k = frame.firstKey; i < values_.size(); ++i, ++k) {
-            object.Add(keys_[k], std::move(values_[i]));
+            members_.push_back({keys_[k], &values_[i]});
         }
+        JsonVariant object = JsonPooledTree::Object(*pool_, members_.data(), members_.size());
         keys_.resize(frame.firstKey);
         values_.resize(frame.firstValue);
-        object.Finish(values_.emplace_back());
+        values_.push_back(std::move(object));
     }
 
     void EndArray() {
         const Frame frame = frames_.back();
         frames_.pop_back();
-        JsonVariant array(JsonKind::Array);
-        array.Reserve(values_.size() - frame.firstValue);
-        for (std::size_t i = frame.firstValue; i < values_.size(); ++i) {
-            array.Append(std::move(values_[i]));
-        }
+        JsonVariant array = JsonPooledTree::Array(*pool_, values_.data() + frame.firstValue,
+                                                  values_.size() - frame.firstValue);
         values_.resize(frame.firstValue);
         values_.push_back(std::move(array));
     }
 
     bool Failed() const noexcept { return failed_; }
-    JsonVariant TakeRoot() { return std::move(values_.back()); }
+    // The root, owning the pool in which the tree was built.
+    JsonVariant TakeRoot() {
+        JsonVariant root(std::move(values_.back()));
+        JsonPooledTree::Adopt(root, std::move(pool_));
+        return root;
+    }
 
 private:
     struct Frame {
@@ -94,7 +108,9 @@ private:
         return {scratch_.data(), count};
     }
 
+    std::unique_ptr<JsonPool> pool_;
     std::vector<JsonVariant> values_;
+    std::vector<JsonPooledTree::Member> members_;
     std::vector<std::string_view> keys_;
     std::deque<std::string> decodedKeys_;
     std::vector<Frame> frames_;
@@ -102,10 +118,8 @@ private:
     bool failed_ = false;
 };
 
-}  // namespace
-
-bool Parse(JsonVariant& variant, const char* text) {
-    TreeBuilder builder;
+bool ParseText(JsonVariant& variant, const char* text, std::size_t length) {
+    TreeBuilder builder(length);
     JsonError error;
     if (!Jsonz::ScanDocument(text, builder, error) || builder.Failed()) {
         variant.Reset();
@@ -115,8 +129,14 @@ bool Parse(JsonVariant& variant, const char* text) {
     return true;
 }
 
+}  // namespace
+
+bool Parse(JsonVariant& variant, const char* text) {
+    return ParseText(variant, text, text != nullptr ? std::strlen(text) : 0);
+}
+
 bool Parse(JsonVariant& variant, const std::string& text) {
-    return Parse(variant, text.c_str());
+    return ParseText(variant, text.c_str(), text.size());
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

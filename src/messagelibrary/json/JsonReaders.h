@@ -9,8 +9,8 @@
 #include <utility>
 #include <vector>
 
-#include "messagelibrary/json/JsonEnum.h"
 #include "errors/ErrorCodes.h"
+#include "messagelibrary/json/JsonEnum.h"
 #include "messagelibrary/json/JsonVariant.h"
 #include "messagelibrary/json/Timestamp.h"
 
@@ -67,8 +67,8 @@ class JsonRecordReader;
 template <typename R, typename = void>
 struct ListsJsonRecordFields : std::false_type {};
 template <typename R>
-struct ListsJsonRecordFields<R, std::void_t<decltype(R::JsonFields(
-                                    std::declval<R&>(), std::declval<JsonRecordReader&>()))>>
+struct ListsJsonRecordFields<
+    R, std::void_t<decltype(R::JsonFields(std::declval<R&>(), std::declval<JsonRecordReader&>()))>>
     : std::true_type {};
 
 template <typename R, typename = void>

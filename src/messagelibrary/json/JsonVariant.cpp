@@ -7,6 +7,7 @@
 #include <new>
 
 #include "messagelibrary/json/JsonBlock.h"
+#include "messagelibrary/json/JsonPooledTree.h"
 #include "messagelibrary/json/JsonText.h"
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
@@ -16,26 +17,30 @@ constexpr std::size_t kInlineCapacity = 11;  // bytes of text kept in place
 constexpr std::size_t kMarker = 11;          // byte: 11 - length, or kHeapText
 constexpr unsigned char kHeapText = 0xFF;
 constexpr std::size_t kWord = 4;  // offset of a number or container pointer
+// Byte 0 of a container: kPooledRoot when it is the root of a parsed tree
+// that owns its pool (JsonPooledTree.h), else 0.
+constexpr std::size_t kPooledRootByte = 0;
+constexpr unsigned char kPooledRoot = 1;
+// Objects of up to this many members are searched from the front.
+constexpr std::size_t kScanLimit = 8;
 
 using Members = JsonBlock::Block<JsonMember>;
 
-// Byte order, then length. Keys are short: a plain loop beats a call to
-// memcmp here.
-bool TextLess(std::string_view a, std::string_view b) noexcept {
-    const std::size_t common = a.size() < b.size() ? a.size() : b.size();
-    for (std::size_t i = 0; i < common; ++i) {
-        if (a[i] != b[i])
-            return static_cast<unsigned char>(a[i]) < static_cast<unsigned char>(b[i]);
+// Whether text starts with the bytes of key. Keys are short: a plain loop
+// beats a call to memcmp here.
+bool SameBytes(const char* text, std::string_view key) noexcept {
+    for (std::size_t i = 0; i < key.size(); ++i) {
+        if (text[i] != key[i]) return false;
     }
-    return a.size() < b.size();
+    return true;
 }
 
 bool MemberLess(const JsonMember& a, const JsonMember& b) noexcept {
-    return TextLess(a.key, b.key);
+    return JsonKeyLess(a.key, b.key);
 }
 
 bool KeyLess(const JsonMember& member, std::string_view key) noexcept {
-    return TextLess(member.key, key);
+    return JsonKeyLess(member.key, key);
 }
 
 // The member with key, or the position where it would be inserted.
@@ -45,8 +50,7 @@ JsonMember* LowerBound(Members* members, std::string_view key) noexcept {
 }
 
 bool IsAt(const Members* members, const JsonMember* position, std::string_view key) noexcept {
-    return position != nullptr && position != members->end() &&
-           position->key == key;
+    return position != nullptr && position != members->end() && position->key == key;
 }
 
 // Sorts by key, keeping the order of equal keys, then keeps only the last of
@@ -127,17 +131,10 @@ JsonVariant::JsonVariant(std::string_view text) {
         SetInlineText(text);
         return;
     }
-    Store(0, JsonText::Allocate(text));
-    payload_[kMarker] = kHeapText;
-    kind_ = JsonKind::String;
+    SetHeapText(JsonText::Allocate(text));
 }
 
 JsonVariant::JsonVariant(const char* text) : JsonVariant(std::string_view(text ? text : "")) {}
-
-JsonVariant::JsonVariant(JsonVariant&& other) noexcept : kind_(other.kind_) {
-    std::memcpy(payload_, other.payload_, sizeof(payload_));
-    other.kind_ = JsonKind::None;
-}
 
 JsonVariant& JsonVariant::operator=(JsonVariant&& other) noexcept {
     if (this != &other) {
@@ -163,10 +160,18 @@ void JsonVariant::Destroy() noexcept {
             if (payload_[kMarker] == kHeapText) JsonText::Free(Load<char*>(0));
             break;
         case JsonKind::Array:
-            JsonBlock::Free(Load<Array*>(kWord));
+            if (IsPooledRoot()) {
+                JsonPooledTree::Release(*this);
+            } else {
+                JsonBlock::Free(Load<Array*>(kWord));
+            }
             break;
         case JsonKind::Object:
-            JsonBlock::Free(Load<Object*>(kWord));
+            if (IsPooledRoot()) {
+                JsonPooledTree::Release(*this);
+            } else {
+                JsonBlock::Free(Load<Object*>(kWord));
+            }
             break;
         default:
             break;
@@ -184,7 +189,29 @@ void JsonVariant::SetInlineText(std::string_view text) noexcept {
 void JsonVariant::SetBlock(JsonKind kind, void* block) noexcept {
     Destroy();
     Store(kWord, block);
+    payload_[kPooledRootByte] = 0;
     kind_ = kind;
+}
+
+void JsonVariant::SetHeapText(char* text) noexcept {
+    Store(0, text);
+    payload_[kMarker] = kHeapText;
+    kind_ = JsonKind::String;
+}
+
+bool JsonVariant::IsPooledRoot() const noexcept {
+    return (kind_ == JsonKind::Array || kind_ == JsonKind::Object) &&
+           payload_[kPooledRootByte] == kPooledRoot;
+}
+
+void JsonVariant::SetRootBlock(void* block) noexcept {
+    Store(kWord, block);
+    payload_[kPooledRootByte] = kPooledRoot;
+}
+
+void JsonVariant::Own() {
+    // The copy is whole before the pool goes: assignment takes it first.
+    if (IsPooledRoot()) *this = JsonPooledTree::Clone(*this);
 }
 
 void JsonVariant::Reset() noexcept {
@@ -244,7 +271,8 @@ void JsonVariant::SetEmptyString() {
     SetInlineText(std::string_view());
 }
 
-void JsonVariant::Clear() noexcept {
+void JsonVariant::Clear() {
+    Own();
     switch (kind_) {
         case JsonKind::String:
             SetEmptyString();
@@ -274,11 +302,13 @@ JsonVariant::Object* JsonVariant::ObjectBlock() const noexcept {
 // The container's block after turning the variant into one. Operations that
 // may move the block store the new pointer back when they are done.
 JsonVariant::Array* JsonVariant::MakeArray() {
+    Own();
     if (!IsArray()) SetBlock(JsonKind::Array, nullptr);
     return Load<Array*>(kWord);
 }
 
 JsonVariant::Object* JsonVariant::MakeObject() {
+    Own();
     if (!IsObject()) SetBlock(JsonKind::Object, nullptr);
     return Load<Object*>(kWord);
 }
@@ -304,11 +334,23 @@ std::size_t JsonVariant::Size() const noexcept {
 
 const JsonVariant* JsonVariant::Find(std::string_view key) const noexcept {
     Object* members = ObjectBlock();
+    if (members == nullptr) return nullptr;
+    // A message's record has a handful of members: a scan that compares
+    // lengths first beats a binary search there.
+    if (members->size <= kScanLimit) {
+        for (const JsonMember& member : *members) {
+            if (member.key.size() == key.size() && SameBytes(member.key.c_str(), key)) {
+                return &member.value;
+            }
+        }
+        return nullptr;
+    }
     JsonMember* position = LowerBound(members, key);
     return IsAt(members, position, key) ? &position->value : nullptr;
 }
 
-JsonVariant* JsonVariant::Find(std::string_view key) noexcept {
+JsonVariant* JsonVariant::Find(std::string_view key) {
+    Own();
     return const_cast<JsonVariant*>(static_cast<const JsonVariant*>(this)->Find(key));
 }
 
@@ -316,7 +358,7 @@ const JsonVariant* JsonVariant::Find(const char* key) const noexcept {
     return key == nullptr ? nullptr : Find(std::string_view(key));
 }
 
-JsonVariant* JsonVariant::Find(const char* key) noexcept {
+JsonVariant* JsonVariant::Find(const char* key) {
     return key == nullptr ? nullptr : Find(std::string_view(key));
 }
 
@@ -402,6 +444,7 @@ JsonVariant& JsonVariant::GetOrAddArray(std::string_view key, bool clear) {
 }
 
 bool JsonVariant::Remove(std::string_view key) {
+    Own();
     Object* members = ObjectBlock();
     JsonMember* position = LowerBound(members, key);
     if (!IsAt(members, position, key)) return false;
@@ -411,6 +454,7 @@ bool JsonVariant::Remove(std::string_view key) {
 }
 
 void JsonVariant::RemoveAllExcept(std::string_view key) {
+    Own();
     Object* members = ObjectBlock();
     if (members == nullptr) return;
     JsonMember* position = LowerBound(members, key);
@@ -466,7 +510,8 @@ JsonVariant& JsonVariant::AppendNull() {
     return Append(JsonVariant(JsonKind::Null));
 }
 
-JsonRange<JsonVariant> JsonVariant::Elements() noexcept {
+JsonRange<JsonVariant> JsonVariant::Elements() {
+    Own();
     Array* elements = ArrayBlock();
     if (elements == nullptr) return {};
     return {elements->begin(), elements->end()};
@@ -484,11 +529,13 @@ const JsonVariant* JsonVariant::At(std::size_t index) const noexcept {
     return &(*elements)[index];
 }
 
-JsonVariant* JsonVariant::At(std::size_t index) noexcept {
+JsonVariant* JsonVariant::At(std::size_t index) {
+    Own();
     return const_cast<JsonVariant*>(static_cast<const JsonVariant*>(this)->At(index));
 }
 
 bool JsonVariant::RemoveAt(std::size_t index) {
+    Own();
     Array* elements = ArrayBlock();
     if (elements == nullptr || index >= elements->size) return false;
     JsonBlock::Erase(elements, index, index + 1);

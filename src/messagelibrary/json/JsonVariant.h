@@ -55,6 +55,11 @@ private:
 // GetOrAdd*, Append, Elements, Members) stay valid until that same
 // container is changed by an insertion or removal.
 //
+// A tree made by Parse lives in one pool owned by its root
+// (JsonPooledTree.h): reading it costs nothing extra, and dropping it frees
+// the pool at once. The first change through its root copies the tree to
+// storage of its own; pointers taken from it before that are then invalid.
+//
 // Text is parsed into a variant with Parse (JsonParser.h) and turned back into
 // text with ToJsonText (JsonVariantText.h). Messages read it only through the
 // reader helpers of JsonReaders.h.
@@ -70,7 +75,10 @@ public:
     explicit JsonVariant(const char* text);  // null gives ""
     explicit JsonVariant(const std::string& text) : JsonVariant(std::string_view(text)) {}
 
-    JsonVariant(JsonVariant&& other) noexcept;
+    JsonVariant(JsonVariant&& other) noexcept : kind_(other.kind_) {
+        for (std::size_t i = 0; i < sizeof(payload_); ++i) payload_[i] = other.payload_[i];
+        other.kind_ = JsonKind::None;
+    }
     JsonVariant& operator=(JsonVariant&& other) noexcept;
     JsonVariant(const JsonVariant&) = delete;
     JsonVariant& operator=(const JsonVariant&) = delete;
@@ -109,14 +117,14 @@ public:
     void SetEmptyString();
     // Empties an object, array or string, keeping the kind; any other kind
     // becomes None.
-    void Clear() noexcept;
+    void Clear();
 
     // ---- Object members ----------------------------------------------------
     // The member's value, or null when this is no object or the key is absent.
     const JsonVariant* Find(std::string_view key) const noexcept;
-    JsonVariant* Find(std::string_view key) noexcept;
+    JsonVariant* Find(std::string_view key);
     const JsonVariant* Find(const char* key) const noexcept;
-    JsonVariant* Find(const char* key) noexcept;
+    JsonVariant* Find(const char* key);
 
     // True and out assigned when the member exists and is a string.
     bool GetString(std::string_view key, std::string& out) const;
@@ -168,11 +176,11 @@ public:
     void Reserve(std::size_t count);
 
     // Elements in order; empty when this is no array.
-    JsonRange<JsonVariant> Elements() noexcept;
+    JsonRange<JsonVariant> Elements();
     JsonRange<const JsonVariant> Elements() const noexcept;
     // Element at index, or null when out of range or no array.
     const JsonVariant* At(std::size_t index) const noexcept;
-    JsonVariant* At(std::size_t index) noexcept;
+    JsonVariant* At(std::size_t index);
     // Removes the element at index; false when out of range or no array.
     bool RemoveAt(std::size_t index);
 
@@ -190,12 +198,20 @@ public:
 
 private:
     friend class JsonObjectBuilder;
+    friend class JsonPooledTree;
     using Array = JsonBlock::Block<JsonVariant>;
     using Object = JsonBlock::Block<JsonMember>;
 
     void Destroy() noexcept;
     void SetInlineText(std::string_view text) noexcept;
     void SetBlock(JsonKind kind, void* block) noexcept;
+    void SetHeapText(char* text) noexcept;
+    // The root of a parsed tree that owns its pool (JsonPooledTree.h).
+    bool IsPooledRoot() const noexcept;
+    // Puts the block of a pooled tree's root in place and marks the root.
+    void SetRootBlock(void* block) noexcept;
+    // Before a change: a pooled tree is copied to storage of its own.
+    void Own();
     Array* ArrayBlock() const noexcept;
     Object* ObjectBlock() const noexcept;
     Array* MakeArray();

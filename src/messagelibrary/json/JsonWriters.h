@@ -62,8 +62,9 @@ struct JsonRaw {
 template <typename R, typename = void>
 struct ListsJsonWritableFields : std::false_type {};
 template <typename R>
-struct ListsJsonWritableFields<R, std::void_t<decltype(R::JsonFields(
-                                      std::declval<const R&>(), std::declval<JsonObjectWriter&>()))>>
+struct ListsJsonWritableFields<R,
+                               std::void_t<decltype(R::JsonFields(
+                                   std::declval<const R&>(), std::declval<JsonObjectWriter&>()))>>
     : std::true_type {};
 
 template <typename R, typename = void>
