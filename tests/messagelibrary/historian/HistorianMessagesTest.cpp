@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "messagelibrary/MessageBodyChecks.h"
 #include "messagelibrary/RequestMessage.h"
 #include "messagelibrary/historian/HistorianSamples.h"
 #include "messagelibrary/taghistorian/TagHistorianAsyncQueryCompleteRoutedMessage.h"
@@ -27,6 +28,9 @@
 namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
 
+using Testing::ExpectRefusals;
+using Testing::Parse;
+using Testing::Written;
 using namespace TagHistorianMessages;
 using namespace TagSubscriptionCommunicatorMessages;
 using namespace TagHttpMessages;
@@ -37,18 +41,6 @@ public:
     Query() : RequestMessage("Query", "application/json", "Somewhere") { SetReplyTo("client_q"); }
     MessageBody Serialize() const override { return MessageBody("{}"); }
 };
-
-template <typename M>
-M Parse(const std::string& body) {
-    MessageBus::MessageHeaders headers;
-    headers.messageType = M::kMessageName;
-    return M(headers, MessageBody(body));
-}
-
-template <typename M>
-std::string Written(const M& message) {
-    return message.Serialize().ToString();
-}
 
 TEST(HistorianMessages, EmptyAndUnsetValueMapsAndUnsetTimesAreWrittenAsTheyShould) {
     const Query query;
@@ -83,16 +75,10 @@ TEST(HistorianMessages, ValueMapsAreReadByPath) {
 }
 
 TEST(HistorianMessages, RefusedFieldsNameTheKeyWithTheCodeOfItsType) {
-    struct Case {
-        std::function<void(const std::string&)> parse;
-        const char* body;
-        int32_t code;
-        const char* key;
-    };
     const auto query = Parse<TagHistorianQueryRequest>;
     const auto values = Parse<TagHistorianQueryResponse>;
     const auto subscription = Parse<TagSubscriptionCommunicatorGetSubscriptionResponse>;
-    const std::vector<Case> cases = {
+    ExpectRefusals({
         {query, R"({"startTime":"yesterday"})", -251005, "startTime"},
         {query, R"({"endTime":null})", -251005, "endTime"},
         {query, R"({"decimation":1e10})", -251005, "decimation"},
@@ -116,11 +102,7 @@ TEST(HistorianMessages, RefusedFieldsNameTheKeyWithTheCodeOfItsType) {
         {Parse<TagHttpUpdateSelectionRoutedMessage>, R"({"selection":[]})", -251004, "selection"},
         {Parse<TagHttpGetSelectionsResponse>, R"({"selections":[{"inactivityTimeout":true}]})",
          -251005, "selections"},
-    };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.body);
-        EXPECT_THROWS_VELDRA(c.parse(c.body), c.code, std::string("Failed to parse: ") + c.key);
-    }
+    });
 }
 
 TEST(HistorianMessages, RoutedAnswersGoToTheReplyQueueWithTheirOwnCorrelation) {

@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "messagelibrary/MessageBodyChecks.h"
 #include "messagelibrary/audit/AuditAddRoutedMessage.h"
 #include "messagelibrary/audit/AuditQueryRequest.h"
 #include "messagelibrary/audit/AuditTypeAddRoutedMessage.h"
@@ -26,24 +27,15 @@
 namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
 
+using Testing::ExpectRefusals;
+using Testing::Parse;
+using Testing::Written;
 using namespace AuditTrailMessages;
 using namespace ConfigurationMessages;
 using namespace SmtpMessages;
 using namespace TimerMessages;
 using namespace WorkflowMessages;
 using MessageBus::MessageBody;
-
-template <typename M>
-M Parse(const std::string& body) {
-    MessageBus::MessageHeaders headers;
-    headers.messageType = M::kMessageName;
-    return M(headers, MessageBody(body));
-}
-
-template <typename M>
-std::string Written(const M& message) {
-    return message.Serialize().ToString();
-}
 
 TEST(TimerMessages, ElapsedMinutesIsWrittenBareWithUpTo17Digits) {
     const double inf = std::numeric_limits<double>::infinity();
@@ -127,18 +119,12 @@ TEST(WorkflowMessages, EnumerationsWriteTheirTexts) {
 }
 
 TEST(OtherMessages, RefusedFieldsNameTheKeyWithTheCodeOfItsType) {
-    struct Case {
-        std::function<void(const std::string&)> parse;
-        const char* body;
-        int32_t code;
-        const char* key;
-    };
     const auto timer = Parse<TimerRegisterCallbackRoutedMessage>;
     const auto decision = Parse<WorkflowDecisionMadeRequest>;
     const auto complete = Parse<WorkflowWorkCompleteRequest>;
     const auto query = Parse<AuditQueryRequest>;
     const auto one = Parse<SmtpGetAddressGroupResponse>;
-    const std::vector<Case> cases = {
+    ExpectRefusals({
         {timer, R"({"callbackType":"ONCE"})", -251004, "callbackType"},
         {timer, R"({"callbackType":"repeat"})", -251004, "callbackType"},
         {timer, R"({"elapsedMinutes":null})", -251005, "elapsedMinutes"},
@@ -167,11 +153,7 @@ TEST(OtherMessages, RefusedFieldsNameTheKeyWithTheCodeOfItsType) {
         {one, R"({"addressGroups":{"ccAddresses":"a@x"}})", -251004, "addressGroups"},
         {Parse<SmtpGetAddressGroupsResponse>, R"({"addressGroups":{}})", -251005, "addressGroups"},
         {Parse<SmtpPublishedEmailBroadcast>, R"({"subject":false})", -251005, "subject"},
-    };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.body);
-        EXPECT_THROWS_VELDRA(c.parse(c.body), c.code, std::string("Failed to parse: ") + c.key);
-    }
+    });
 }
 
 }  // namespace

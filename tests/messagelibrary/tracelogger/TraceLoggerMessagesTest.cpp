@@ -4,7 +4,6 @@
 #include <string>
 #include <vector>
 
-#include "support/CatchVeldra.h"
 #include "messagelibrary/MessageClassCases.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerCommandRequest.h"
@@ -14,6 +13,7 @@
 #include "messagelibrary/tracelogger/TraceLoggerStoreEntriesRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerTracePointListRequest.h"
 #include "messagelibrary/tracelogger/TraceLoggerTracePointListResponse.h"
+#include "support/CatchVeldra.h"
 
 namespace Korvane::Veldra::MessageBus::Testing {
 namespace {
