@@ -1,11 +1,13 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
 #include <ostream>
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
@@ -16,6 +18,9 @@ namespace Korvane::Veldra::VeldraMessageLibrary {
 // and members move as plain bytes when an object is sorted.
 class JsonKey {
 public:
+    // Bytes of a key kept in place.
+    static constexpr std::size_t kInlineCapacity = 15;
+
     JsonKey() noexcept { Clear(); }
     explicit JsonKey(std::string_view text) {
         if (text.size() <= kInline) {
@@ -82,7 +87,7 @@ public:
     }
 
 private:
-    static constexpr std::size_t kInline = 15;
+    static constexpr std::size_t kInline = kInlineCapacity;
     static constexpr std::size_t kMarker = 15;  // 15 - length, or kHeapMarker
     static constexpr char kHeapMarker = static_cast<char>(0xFF);
     static constexpr char kBorrowedMarker = static_cast<char>(0xFE);
@@ -118,6 +123,25 @@ inline bool JsonKeyLess(std::string_view a, std::string_view b) noexcept {
             return static_cast<unsigned char>(a[i]) < static_cast<unsigned char>(b[i]);
     }
     return a.size() < b.size();
+}
+
+// Sorts count items by the key keyOf gives, keeping the order of equal keys:
+// in place for the few members of a record, with a merge beyond.
+template <typename T, typename KeyOf>
+void SortByJsonKey(T* items, std::size_t count, KeyOf keyOf) {
+    constexpr std::size_t kInPlaceLimit = 32;
+    const auto less = [&keyOf](const T& a, const T& b) { return JsonKeyLess(keyOf(a), keyOf(b)); };
+    if (count > kInPlaceLimit) {
+        std::stable_sort(items, items + count, less);
+        return;
+    }
+    for (std::size_t i = 1; i < count; ++i) {
+        if (!less(items[i], items[i - 1])) continue;
+        T moving = std::move(items[i]);
+        std::size_t j = i;
+        for (; j > 0 && less(moving, items[j - 1]); --j) items[j] = std::move(items[j - 1]);
+        items[j] = std::move(moving);
+    }
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

@@ -1,7 +1,5 @@
 #include "messagelibrary/json/JsonPooledTree.h"
 
-#include <algorithm>
-#include <cstring>
 #include <new>
 #include <utility>
 
@@ -11,10 +9,6 @@
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
-
-constexpr std::size_t kInlineText = 11;  // as JsonVariant keeps in place
-constexpr std::size_t kInlineKey = 15;   // as JsonKey keeps in place
-constexpr std::size_t kInsertionSortLimit = 32;
 
 // What stands before the root's block: the pool it owns. Sixteen bytes, so
 // that the block after it keeps the alignment of a new allocation.
@@ -32,39 +26,14 @@ JsonBlock::Block<T>* PoolBlock(JsonPool& pool, std::size_t count) {
     return block;
 }
 
-// A copy of the text in the pool, zero-terminated, with the length before it
-// as JsonText keeps it.
+// A copy of the text in the pool, laid out as JsonText keeps it.
 char* PoolText(JsonPool& pool, std::string_view text) {
-    char* block = static_cast<char*>(pool.Allocate(sizeof(std::size_t) + text.size() + 1));
-    char* copy = block + sizeof(std::size_t);
-    JsonText::SetLength(copy, text.size());
-    if (!text.empty()) std::memcpy(copy, text.data(), text.size());
-    copy[text.size()] = '\0';
-    return copy;
+    return JsonText::Place(pool.Allocate(JsonText::BlockSize(text.size())), text);
 }
 
 JsonKey PoolKey(JsonPool& pool, std::string_view key) {
-    if (key.size() <= kInlineKey) return JsonKey(key);
+    if (key.size() <= JsonKey::kInlineCapacity) return JsonKey(key);
     return JsonKey::Borrowed(PoolText(pool, key), key.size());
-}
-
-bool MemberBefore(const JsonPooledTree::Member& a, const JsonPooledTree::Member& b) noexcept {
-    return JsonKeyLess(a.key, b.key);
-}
-
-// Stable: of equal keys the one given first stays first.
-void SortMembers(JsonPooledTree::Member* members, std::size_t count) {
-    if (std::is_sorted(members, members + count, MemberBefore)) return;
-    if (count > kInsertionSortLimit) {
-        std::stable_sort(members, members + count, MemberBefore);
-        return;
-    }
-    for (std::size_t i = 1; i < count; ++i) {
-        const JsonPooledTree::Member moving = members[i];
-        std::size_t j = i;
-        for (; j > 0 && MemberBefore(moving, members[j - 1]); --j) members[j] = members[j - 1];
-        members[j] = moving;
-    }
 }
 
 // The root's block, moved out of the pool into an allocation of its own
@@ -89,7 +58,7 @@ JsonBlock::Block<T>* RootBlock(JsonBlock::Block<T>* pooled, JsonPool* pool) {
 
 JsonVariant JsonPooledTree::String(JsonPool& pool, std::string_view text) {
     JsonVariant node;
-    if (text.size() <= kInlineText) {
+    if (text.size() <= JsonVariant::kInlineTextCapacity) {
         node.SetInlineText(text);
     } else {
         node.SetHeapText(PoolText(pool, text));
@@ -111,7 +80,7 @@ JsonVariant JsonPooledTree::Array(JsonPool& pool, JsonVariant* values, std::size
 }
 
 JsonVariant JsonPooledTree::Object(JsonPool& pool, Member* members, std::size_t count) {
-    SortMembers(members, count);
+    SortByJsonKey(members, count, [](const Member& member) { return member.key; });
     // Of each run of equal keys only the last stays.
     std::size_t kept = 0;
     for (std::size_t i = 0; i < count; ++i) {
@@ -138,7 +107,7 @@ void JsonPooledTree::Adopt(JsonVariant& root, std::unique_ptr<JsonPool> pool) {
     switch (root.kind_) {
         case JsonKind::String:
             // A long text is in the pool: the root takes a copy of its own.
-            if (root.AsText().size() > kInlineText) {
+            if (root.AsText().size() > JsonVariant::kInlineTextCapacity) {
                 JsonVariant own(root.AsText());
                 Forget(root);
                 root = std::move(own);

@@ -12,13 +12,23 @@ inline void SetLength(char* text, std::size_t length) noexcept {
     std::memcpy(text - sizeof(std::size_t), &length, sizeof(length));
 }
 
-inline char* Allocate(std::string_view content) {
-    char* block = new char[sizeof(std::size_t) + content.size() + 1];
-    char* text = block + sizeof(std::size_t);
+// The bytes a text of this length takes: its length, its bytes, a zero.
+inline std::size_t BlockSize(std::size_t length) noexcept {
+    return sizeof(std::size_t) + length + 1;
+}
+
+// Writes content into a block of BlockSize(content.size()) bytes; returns the
+// pointer to its bytes, which is what a variant keeps.
+inline char* Place(void* block, std::string_view content) noexcept {
+    char* text = static_cast<char*>(block) + sizeof(std::size_t);
     SetLength(text, content.size());
     if (!content.empty()) std::memcpy(text, content.data(), content.size());
     text[content.size()] = '\0';
     return text;
+}
+
+inline char* Allocate(std::string_view content) {
+    return Place(new char[BlockSize(content.size())], content);
 }
 
 inline void Free(char* text) noexcept {

@@ -13,8 +13,8 @@
 namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
 
-constexpr std::size_t kInlineCapacity = 11;  // bytes of text kept in place
-constexpr std::size_t kMarker = 11;          // byte: 11 - length, or kHeapText
+constexpr std::size_t kInlineCapacity = JsonVariant::kInlineTextCapacity;
+constexpr std::size_t kMarker = 11;  // byte: 11 - length, or kHeapText
 constexpr unsigned char kHeapText = 0xFF;
 constexpr std::size_t kWord = 4;  // offset of a number or container pointer
 // Byte 0 of a container: kPooledRoot when it is the root of a parsed tree
@@ -33,10 +33,6 @@ bool SameBytes(const char* text, std::string_view key) noexcept {
         if (text[i] != key[i]) return false;
     }
     return true;
-}
-
-bool MemberLess(const JsonMember& a, const JsonMember& b) noexcept {
-    return JsonKeyLess(a.key, b.key);
 }
 
 bool KeyLess(const JsonMember& member, std::string_view key) noexcept {
@@ -59,21 +55,7 @@ void SortAndDeduplicate(Members* members) {
     if (members == nullptr || members->size < 2) return;
     JsonMember* first = members->begin();
     const std::size_t size = members->size;
-    bool sorted = true;
-    for (std::size_t i = 1; i < size && sorted; ++i) sorted = MemberLess(first[i - 1], first[i]);
-    if (sorted) return;
-    if (size <= 32) {
-        for (std::size_t i = 1; i < size; ++i) {
-            if (!MemberLess(first[i], first[i - 1])) continue;
-            JsonMember moving = std::move(first[i]);
-            std::size_t j = i;
-            for (; j > 0 && MemberLess(moving, first[j - 1]); --j)
-                first[j] = std::move(first[j - 1]);
-            first[j] = std::move(moving);
-        }
-    } else {
-        std::stable_sort(first, first + size, MemberLess);
-    }
+    SortByJsonKey(first, size, [](const JsonMember& member) { return member.key.View(); });
     std::size_t kept = 0;
     for (std::size_t i = 0; i < size; ++i) {
         if (i + 1 < size && first[i].key == first[i + 1].key) continue;

@@ -65,6 +65,9 @@ private:
 // reader helpers of JsonReaders.h.
 class alignas(8) JsonVariant {
 public:
+    // Bytes of a text kept inside the variant; a longer one is stored apart.
+    static constexpr std::size_t kInlineTextCapacity = 11;
+
     JsonVariant() noexcept = default;
     // An empty value of the kind: null, false, 0.0, "", [] or {}. A kind
     // outside 0..6 throws std::bad_alloc.
