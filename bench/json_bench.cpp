@@ -28,6 +28,7 @@
 namespace Korvane::Veldra::VeldraMessageLibrary::Bench {
 
 // ---- The records, declared the way message families declare theirs ----------
+// (each names its fields once, for the writer and the reader)
 
 enum class DataType : int32_t { None = 0, Double = 1, Int = 2, String = 3, Boolean = 4 };
 constexpr JsonEnumText kDataTypeTexts[] = {
@@ -40,6 +41,13 @@ struct Value {
     Timestamp timestamp;
     std::optional<DataType> type;
     std::optional<std::string> value;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("timestamp", self.timestamp)
+            .Field("type", self.type)
+            .Field("value", self.value);
+    }
 };
 
 struct Aggregates {
@@ -47,6 +55,14 @@ struct Aggregates {
     double avg = 0.0;
     std::optional<std::string> min;
     std::optional<std::string> max;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("count", self.count)
+            .Field("avg", self.avg)
+            .Field("min", self.min)
+            .Field("max", self.max);
+    }
 };
 
 struct Tag {
@@ -56,70 +72,59 @@ struct Tag {
     std::optional<JsonStringList> keywords;
     std::optional<JsonStringMap> properties;
     std::optional<Aggregates> aggregates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path)
+            .Field("type", self.type)
+            .Field("current", self.current)
+            .Field("keywords", self.keywords)
+            .Field("properties", self.properties)
+            .Field("aggregates", self.aggregates);
+    }
 };
 
 struct QueryResponse {
     std::optional<std::vector<Tag>> tags;
     int32_t totalCount = 0;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("tags", self.tags).Field("totalCount", self.totalCount);
+    }
 };
 
 struct Sample {
     std::optional<std::string> path;
     std::optional<Value> value;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("path", self.path).Field("value", self.value);
+    }
 };
 
 struct Update {
     std::optional<std::vector<Sample>> updates;
+
+    template <typename Self, typename Fields>
+    static void JsonFields(Self& self, Fields& fields) {
+        fields.Field("updates", self.updates);
+    }
 };
 
-void WriteJsonFields(JsonObjectWriter& out, const Value& v) {
-    out.Field("timestamp", v.timestamp).Field("type", v.type).Field("value", v.value);
+// A message's Serialize() and parsing constructor, over the same field lists.
+template <typename Message>
+std::string Serialize(const Message& m) {
+    JsonBodyWriter writer;
+    Message::JsonFields(m, writer);
+    return writer.Finish();
 }
-bool ReadJsonFields(Value& v, const JsonVariant& o) {
-    return ReadField(v.timestamp, o, "timestamp") && ReadField(v.type, o, "type") &&
-           ReadField(v.value, o, "value");
-}
-void WriteJsonFields(JsonObjectWriter& out, const Aggregates& a) {
-    out.Field("count", a.count).Field("avg", a.avg).Field("min", a.min).Field("max", a.max);
-}
-bool ReadJsonFields(Aggregates& a, const JsonVariant& o) {
-    return ReadField(a.count, o, "count") && ReadField(a.avg, o, "avg") &&
-           ReadField(a.min, o, "min") && ReadField(a.max, o, "max");
-}
-void WriteJsonFields(JsonObjectWriter& out, const Tag& t) {
-    out.Field("path", t.path)
-        .Field("type", t.type)
-        .Field("current", t.current)
-        .Field("keywords", t.keywords)
-        .Field("properties", t.properties)
-        .Field("aggregates", t.aggregates);
-}
-bool ReadJsonFields(Tag& t, const JsonVariant& o) {
-    return ReadField(t.path, o, "path") && ReadField(t.type, o, "type") &&
-           ReadField(t.current, o, "current") && ReadField(t.keywords, o, "keywords") &&
-           ReadField(t.properties, o, "properties") && ReadField(t.aggregates, o, "aggregates");
-}
-void WriteJsonFields(JsonObjectWriter& out, const Sample& s) {
-    out.Field("path", s.path).Field("value", s.value);
-}
-bool ReadJsonFields(Sample& s, const JsonVariant& o) {
-    return ReadField(s.path, o, "path") && ReadField(s.value, o, "value");
-}
-
-// A message's Serialize() and parsing constructor.
-std::string Serialize(const QueryResponse& m) {
-    return JsonBodyWriter().Field("tags", m.tags).Field("totalCount", m.totalCount).Finish();
-}
-std::string Serialize(const Update& m) {
-    return JsonBodyWriter().Field("updates", m.updates).Finish();
-}
-void Deserialize(const std::string& body, QueryResponse& m) {
-    const JsonVariant json = ParseJsonBody(body, "QueryResponse");
-    JsonBodyReader(json).Field("tags", m.tags).Field("totalCount", m.totalCount);
-}
-void Deserialize(const std::string& body, Update& m) {
-    const JsonVariant json = ParseJsonBody(body, "Update");
-    JsonBodyReader(json).Field("updates", m.updates);
+template <typename Message>
+void Deserialize(const std::string& body, Message& m) {
+    const JsonVariant json = ParseJsonBody(body, "BenchMessage");
+    const JsonBodyReader reader(json);
+    Message::JsonFields(m, reader);
 }
 
 // ---- Test data -----------------------------------------------------------------

@@ -22,6 +22,7 @@
 #include "messagebus/service/MessageService.h"
 #include "messagelibrary/RequestMessage.h"
 #include "support/BenchBroker.h"
+#include "support/BenchServices.h"
 #include "support/Ratios.h"
 
 namespace {
@@ -39,17 +40,6 @@ public:
     Bus::MessageBody Serialize() const override {
         return Bus::MessageBody(std::string(R"({"paths":["Plant1.Area2.Line3.Sensor00042"]})"));
     }
-};
-
-class Responder : public Bus::Interfaces::IBroadcastCallback {
-public:
-    explicit Responder(Bus::MessageService& service) : service_(service) {}
-    void OnMessage(std::shared_ptr<Bus::GenericMessage> message) override {
-        service_.SendResponse(*message);
-    }
-
-private:
-    Bus::MessageService& service_;
 };
 
 class WindowRelease : public Bus::Interfaces::IResponseCallback {
@@ -72,13 +62,6 @@ long ResidentKiB() {
     return resident * (sysconf(_SC_PAGESIZE) / 1024);
 }
 
-Bus::MessageServiceSettings Settings(Bus::AmqpConnectionManager& manager, const char* name) {
-    Bus::MessageServiceSettings settings;
-    settings.Name = name;
-    settings.ConnectionManager = &manager;
-    return settings;
-}
-
 }  // namespace
 
 int main() {
@@ -92,10 +75,10 @@ int main() {
     }
     auto serverManager = Bench::MakeManager(*broker, "kvveldra.bench.memory");
     auto clientManager = Bench::MakeManager(*broker, "kvveldra.bench.memory");
-    Bus::MessageService server(Settings(*serverManager, "memory_server"));
-    Bus::MessageService client(Settings(*clientManager, "memory_client"));
-    server.Subscriber()->RegisterMessageCallback("MemoryRequest",
-                                                 std::make_shared<Responder>(server), false);
+    Bus::MessageService server(Bench::ServiceSettings(*serverManager, "memory_server"));
+    Bus::MessageService client(Bench::ServiceSettings(*clientManager, "memory_client"));
+    server.Subscriber()->RegisterMessageCallback(
+        "MemoryRequest", std::make_shared<Bench::AnsweringResponder>(server), false);
     Bus::Semaphore window;
     for (int i = 0; i < kWindow; ++i) window.Release();
     WindowRelease release(window);

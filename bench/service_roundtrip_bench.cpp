@@ -36,6 +36,7 @@
 #include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/RequestMessage.h"
 #include "support/BenchBroker.h"
+#include "support/BenchServices.h"
 #include "support/Ratios.h"
 
 namespace {
@@ -49,8 +50,10 @@ constexpr int kPipelineWindow = 32;  // requests in flight per thread
 constexpr int kPipelinePerThread = 5000;
 constexpr int kReplyTimeoutMs = 5000;
 
+using Korvane::Veldra::Bench::AnsweringResponder;
 using Korvane::Veldra::Bench::BrokerAddress;
 using Korvane::Veldra::Bench::BrokerOrSkip;
+using Korvane::Veldra::Bench::ServiceSettings;
 
 // ---- Directly on rabbitmq-c ----
 
@@ -233,27 +236,8 @@ std::string RawName(const benchmark::State& state, const char* base) {
     return std::string(base) + (state.range(0) == 0 ? "_minimal" : "");
 }
 
-// Answers every "BenchRequest" with a GenericResponse.
-class ServiceResponder : public Bus::Interfaces::IBroadcastCallback {
-public:
-    explicit ServiceResponder(Bus::MessageService& service) : service_(service) {}
-    void OnMessage(std::shared_ptr<Bus::GenericMessage> message) override {
-        service_.SendResponse(*message);
-    }
-
-private:
-    Bus::MessageService& service_;
-};
-
 std::unique_ptr<Bus::AmqpConnectionManager> MakeManager(const BrokerAddress& broker) {
     return Korvane::Veldra::Bench::MakeManager(broker, "kvveldra.bench.service");
-}
-
-Bus::MessageServiceSettings Settings(Bus::AmqpConnectionManager& manager, const char* name) {
-    Bus::MessageServiceSettings settings;
-    settings.Name = name;
-    settings.ConnectionManager = &manager;
-    return settings;
 }
 
 // Client and server each with a manager of their own, as two processes would.
@@ -261,10 +245,10 @@ struct ServiceWorld {
     explicit ServiceWorld(const BrokerAddress& broker)
         : serverManager(MakeManager(broker)),
           clientManager(MakeManager(broker)),
-          server(Settings(*serverManager, "bench_server")),
-          client(Settings(*clientManager, "bench_client")) {
+          server(ServiceSettings(*serverManager, "bench_server")),
+          client(ServiceSettings(*clientManager, "bench_client")) {
         server.Subscriber()->RegisterMessageCallback(
-            "BenchRequest", std::make_shared<ServiceResponder>(server), false);
+            "BenchRequest", std::make_shared<AnsweringResponder>(server), false);
     }
     std::unique_ptr<Bus::AmqpConnectionManager> serverManager, clientManager;
     Bus::MessageService server, client;
