@@ -1,0 +1,88 @@
+# Debian packages, one per install component, made by `cpack -G DEB` (or plain
+# `cpack`) in the build directory:
+#
+#   runtime -> libkvveldra-tag1     libkvveldra_tag.so.1* and libkvsslinit.so.13
+#   dev     -> libkvveldra-tag-dev  headers, CMake package, pkg-config file and
+#                                   the libkvveldra_tag.so link
+#   tools   -> kvveldra-tools       the command-line tools and the reference
+#                                   tag service
+#
+# Only these three components are packaged. Whatever installs under another
+# component or under none ("Unspecified") stays out of every package; tests,
+# benchmarks and the host stand-in install nothing at all. The demo installs as
+# component "demo" and is left out: it runs only against a broker and a service
+# set up as scripts/demo.sh does, and its source is the part worth reading.
+#
+# The packages take the install directories of the build: configured with
+# -DCMAKE_INSTALL_PREFIX=/usr, GNUInstallDirs chooses Debian's multiarch library
+# directory (usr/lib/<triplet>); with the default prefix it is usr/lib. Both
+# work, as the CMake package and the pkg-config file locate themselves.
+
+set(KVVELDRA_PACKAGE_MAINTAINER "kvveldra_tag maintainers <kvveldra-tag@example.org>"
+  CACHE STRING "Maintainer field of the Debian packages")
+set(KVVELDRA_PACKAGE_RELEASE "1"
+  CACHE STRING "Debian revision of the packages (the part after the version's hyphen)")
+
+set(CPACK_GENERATOR DEB)
+set(CPACK_PACKAGE_NAME kvveldra-tag)
+set(CPACK_PACKAGE_VENDOR "kvveldra_tag")
+set(CPACK_PACKAGE_VERSION ${PROJECT_VERSION})
+set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
+# Release packages carry no debug sections; the build tree keeps them.
+set(CPACK_STRIP_FILES ON)
+
+set(CPACK_DEB_COMPONENT_INSTALL ON)
+set(CPACK_COMPONENTS_ALL runtime dev tools)
+set(CPACK_COMPONENT_DEV_DEPENDS runtime)
+set(CPACK_COMPONENT_TOOLS_DEPENDS runtime)
+
+set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
+set(CPACK_DEBIAN_PACKAGE_RELEASE ${KVVELDRA_PACKAGE_RELEASE})
+set(CPACK_DEBIAN_PACKAGE_MAINTAINER "${KVVELDRA_PACKAGE_MAINTAINER}")
+set(CPACK_DEBIAN_PACKAGE_PRIORITY optional)
+# The component dependencies above become "<package> (= <version>-<release>)".
+set(CPACK_DEBIAN_ENABLE_COMPONENT_DEPENDS ON)
+# dpkg-shlibdeps names the shared libraries' packages as the Debian release the
+# packages are built on calls them (librabbitmq4, libssl3, libstdc++6, ...).
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
+# For a tool that links libkvveldra_tag.so.1, dpkg-shlibdeps finds the library
+# in the build tree; the component dependency names its package.
+get_target_property(kvveldra_tag_dir kvveldra_tag LIBRARY_OUTPUT_DIRECTORY)
+if(NOT kvveldra_tag_dir)
+  get_target_property(kvveldra_tag_dir kvveldra_tag BINARY_DIR)
+endif()
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${kvveldra_tag_dir})
+
+set(CPACK_DEBIAN_RUNTIME_PACKAGE_NAME libkvveldra-tag1)
+set(CPACK_DEBIAN_RUNTIME_PACKAGE_SECTION libs)
+# A shlibs file in the package of each shared library (only the runtime
+# package has any), so that packages built against them depend on it.
+set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)
+set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS_POLICY ">=")
+set(CPACK_DEBIAN_RUNTIME_DESCRIPTION
+  "Client library for a tag service over an AMQP message bus
+Named, typed current values with keywords, properties and aggregates, kept by
+remote services that an AMQP 0-9-1 broker connects. The library exports two
+families of functions: blocking TagConsole* calls with standard C++ types and
+non-blocking TagWB* calls for a graphical dataflow host.
+.
+This package holds the shared library and libkvsslinit, the TLS start-up
+library that it loads at run time.")
+
+set(CPACK_DEBIAN_DEV_PACKAGE_NAME libkvveldra-tag-dev)
+set(CPACK_DEBIAN_DEV_PACKAGE_SECTION libdevel)
+set(CPACK_DEBIAN_DEV_DESCRIPTION
+  "Client library for a tag service - development files
+The public headers (kvveldra/TagConsole.h, kvveldra/TagWB.h), the CMake package
+(find_package(kvveldra_tag), target kvveldra::kvveldra_tag) and the pkg-config
+file (kvveldra_tag) for building programs against libkvveldra_tag.")
+
+set(CPACK_DEBIAN_TOOLS_PACKAGE_NAME kvveldra-tools)
+set(CPACK_DEBIAN_TOOLS_PACKAGE_SECTION net)
+set(CPACK_DEBIAN_TOOLS_DESCRIPTION
+  "Client library for a tag service - tools
+Command-line tools for the tag library and kvveldra-tagservice, a reference tag
+service that keeps tags in memory or in an SQLite file and answers on the
+message bus.")
+
+include(CPack)
