@@ -154,6 +154,31 @@ Rendered List(const Invocation& call, const ConsoleInstance& instance, OpenedTag
     return RenderList(report);
 }
 
+// The service answers a read in its own order, possibly with fewer records,
+// and gives no type for a tag never written: the records are put in the
+// order of the tags asked for, one each, with the type the lookup gave when
+// the record has none, and an empty record for a tag the answer left out.
+std::vector<TagConsoleValue> InRequestOrder(const std::vector<FoundTag>& tags,
+                                            std::vector<TagConsoleValue> records) {
+    std::vector<bool> used(records.size(), false);
+    std::vector<TagConsoleValue> ordered;
+    for (const auto& tag : tags) {
+        TagConsoleValue value;
+        value.path = tag.path;
+        value.timestamp = TagConsoleTime::min();
+        for (std::size_t i = 0; i < records.size(); ++i) {
+            if (!used[i] && records[i].path == tag.path) {
+                used[i] = true;
+                value = std::move(records[i]);
+                break;
+            }
+        }
+        if (value.dataType < 0 || value.dataType > 5) value.dataType = tag.type;
+        ordered.push_back(std::move(value));
+    }
+    return ordered;
+}
+
 std::vector<TagConsoleValue> ReadValues(const ConsoleInstance& instance,
                                         const std::vector<FoundTag>& tags) {
     const auto references = References(tags);
@@ -162,7 +187,7 @@ std::vector<TagConsoleValue> ReadValues(const ConsoleInstance& instance,
     Check("read",
           TagConsoleReadValues(instance.Id(), &references, instance.Verbose(), 0, &values, &error),
           error);
-    return values;
+    return InRequestOrder(tags, std::move(values));
 }
 
 Rendered Keywords(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {

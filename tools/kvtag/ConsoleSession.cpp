@@ -37,7 +37,10 @@ ConsoleInstance::ConsoleInstance(const GlobalOptions& options) : verbose_(option
         // is harmless when there is none.
         std::string ignored;
         TagConsoleCloseInstance(id_, &ignored);
-        throw LibraryError("connect", status, error);
+        // The library's text does not name the configuration; this does.
+        throw LibraryError(options.config ? "connect with configuration '" + *options.config + "'"
+                                          : std::string("connect with the default configuration"),
+                           status, error);
     }
 }
 

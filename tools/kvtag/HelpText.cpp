@@ -7,7 +7,8 @@ constexpr const char* kGlobal =
     "Global options (anywhere on the line):\n"
     "  --config ID     the broker configuration to use (VeldraConfigurations/ID.json\n"
     "                  under $VELDRA_DATA_DIR); default: the library's default one\n"
-    "  --timeout MS    how long connecting to the broker may take (default 10000)\n"
+    "  --timeout MS    how long connecting to the broker may take (default 10000);\n"
+    "                  requests to the service time out after 10 s regardless\n"
     "  --json          print exactly one JSON document on standard output\n"
     "  --verbose       show the library's progress on standard error\n"
     "  --help, -h      show help\n";

@@ -73,6 +73,8 @@ TEST_F(KvtagBrokerTest, CreateWriteReadRoundTrip) {
               "created " + flow + " (double)\n");
     EXPECT_NE(Expect(2, {"create", flow, "--type", "double"}).err.find("exists already"),
               std::string::npos);
+    // Never written: no value and no time, but its type all the same.
+    EXPECT_EQ(Expect(0, {"read", flow}).out, flow + "\tdouble\t\t-\n");
 
     EXPECT_EQ(Expect(0, {"write", flow, "12.5", "--time", "2026-03-01T09:30:00.000250+01:00"}).out,
               "wrote 1 sample to " + flow + " (double)\n");
@@ -101,6 +103,9 @@ TEST_F(KvtagBrokerTest, CreateWriteReadRoundTrip) {
     EXPECT_EQ(Text(*values->At(0), "time"), "2026-03-01T08:30:00.000250Z");
     EXPECT_TRUE(values->At(0)->Find("aggregates")->IsNull());
     EXPECT_EQ(Text(*values->At(1), "value"), "Ana \"night\"\tshift");
+    // Lines come in the order of the arguments.
+    const std::string reversed = Expect(0, {"read", name, flow}).out;
+    EXPECT_EQ(reversed.substr(0, name.size() + 1), name + "\t") << reversed;
     EXPECT_EQ(Text(*values->At(1), "type"), "string");
 }
 
