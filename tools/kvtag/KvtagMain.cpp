@@ -78,9 +78,11 @@ int main(int argc, char** argv) {
     std::signal(SIGPIPE, SIG_IGN);
     const std::vector<std::string> args(argv + 1, argv + argc);
     const bool json = kvtag::WantsJson(args);
-    const std::string label = CommandLabel(args);
+    // The best guess until the line is parsed, then the command itself.
+    std::string label = CommandLabel(args);
     try {
         const kvtag::Invocation call = kvtag::ParseCommandLine(args);
+        label = kvtag::CommandName(call.command);
         if (call.command == kvtag::Command::Help) {
             std::fputs(kvtag::HelpText(call.helpTopic).c_str(), stdout);
             return 0;

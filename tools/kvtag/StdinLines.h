@@ -19,7 +19,7 @@ struct StdinLine {
     std::size_t lineNumber = 0;
     std::string path;
     std::string value;
-    std::optional<TagConsoleTime> time;  // none: the time of reading
+    std::optional<TagConsoleTime> time;  // none: the current time at sending
 };
 
 // The samples of one tag in the order of their lines.
