@@ -1,0 +1,83 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "CommandLine.h"
+
+namespace kvtag {
+
+// The process's reservation of the console family, released on
+// destruction. Throws LibraryError when the reservation fails.
+class Reservation {
+public:
+    Reservation();
+    ~Reservation();
+    Reservation(const Reservation&) = delete;
+    Reservation& operator=(const Reservation&) = delete;
+
+private:
+    bool reserved_ = false;
+};
+
+// One initialized instance of the console family on the broker the
+// options name, closed on destruction. It lives inside a Reservation.
+class ConsoleInstance {
+public:
+    // The connect time-out when --timeout is not given.
+    static constexpr uint32_t kDefaultTimeoutMs = 10000;
+
+    ConsoleInstance(const GlobalOptions& options);
+    ~ConsoleInstance();
+    ConsoleInstance(const ConsoleInstance&) = delete;
+    ConsoleInstance& operator=(const ConsoleInstance&) = delete;
+
+    uint64_t Id() const { return id_; }
+    bool Verbose() const { return verbose_; }
+
+private:
+    // Not 0: the default instance ignores the configuration and time-out.
+    static constexpr uint64_t kInstanceId = 1;
+    uint64_t id_ = kInstanceId;
+    bool verbose_ = false;
+};
+
+// Tag references that this run opened; each is closed once per opening,
+// on destruction, before the instance goes.
+class OpenedTags {
+public:
+    explicit OpenedTags(bool verbose) : verbose_(verbose) {}
+    ~OpenedTags();
+    OpenedTags(const OpenedTags&) = delete;
+    OpenedTags& operator=(const OpenedTags&) = delete;
+
+    void Add(uint32_t reference) { references_.push_back(reference); }
+
+private:
+    bool verbose_;
+    std::vector<uint32_t> references_;
+};
+
+// A tag found on the service and opened here.
+struct FoundTag {
+    std::string path;
+    int32_t type = -1;
+    uint32_t reference = 0;
+};
+
+// Looks up the tag of an exact path without creating it; nothing when the
+// service has no such tag. Throws LibraryError.
+std::optional<FoundTag> FindTag(const ConsoleInstance& instance, const std::string& path,
+                                OpenedTags& opened);
+
+// Creates the tag (or opens it when it has the type already). Throws
+// LibraryError.
+FoundTag CreateTag(const ConsoleInstance& instance, const std::string& path, int32_t type,
+                   OpenedTags& opened);
+
+// Throws LibraryError for a non-zero status.
+void Check(const std::string& operation, int32_t status, const std::string& error);
+
+}  // namespace kvtag

@@ -1,0 +1,232 @@
+#include "Report.h"
+
+#include <algorithm>
+
+#include "JsonWriter.h"
+#include "TagTypes.h"
+#include "TimeText.h"
+
+namespace kvtag {
+namespace {
+
+void WriteTime(JsonWriter& json, TagConsoleTime time) {
+    const std::string text = FormatIsoTime(time);
+    if (text.empty()) {
+        json.Null();
+    } else {
+        json.String(text);
+    }
+}
+
+std::string TimeOrDash(TagConsoleTime time) {
+    const std::string text = FormatIsoTime(time);
+    return text.empty() ? "-" : text;
+}
+
+void WriteAggregates(JsonWriter& json, const TagConsoleValue& value) {
+    json.BeginObject()
+        .Key("count")
+        .Integer(value.aggregateCount)
+        .Key("average")
+        .Number(value.aggregateAverage)
+        .Key("minimum")
+        .String(value.aggregateMinimum)
+        .Key("maximum")
+        .String(value.aggregateMaximum)
+        .EndObject();
+}
+
+std::string AggregatesText(const TagConsoleValue& value) {
+    return "count " + std::to_string(value.aggregateCount) + ", average " +
+           NumberText(value.aggregateAverage) + ", minimum " + value.aggregateMinimum +
+           ", maximum " + value.aggregateMaximum;
+}
+
+}  // namespace
+
+Rendered RenderList(const ListReport& report) {
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject()
+        .Key("total")
+        .Integer(report.total)
+        .Key("skip")
+        .Integer(report.skip)
+        .Key("take")
+        .Integer(report.take)
+        .Key("tags")
+        .BeginArray();
+    for (const auto& tag : report.tags) {
+        out.text += tag.path + "\t" + TypeName(tag.type) + "\n";
+        json.BeginObject()
+            .Key("path")
+            .String(tag.path)
+            .Key("type")
+            .String(TypeName(tag.type))
+            .EndObject();
+    }
+    json.EndArray().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderValues(const std::vector<TagConsoleValue>& values) {
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject().Key("values").BeginArray();
+    for (const auto& value : values) {
+        out.text += value.path + "\t" + TypeName(value.dataType) + "\t" + value.value + "\t" +
+                    TimeOrDash(value.timestamp);
+        if (value.aggregateCount > 0) out.text += "\t(" + AggregatesText(value) + ")";
+        out.text += "\n";
+        json.BeginObject()
+            .Key("path")
+            .String(value.path)
+            .Key("type")
+            .String(TypeName(value.dataType))
+            .Key("value")
+            .String(value.value)
+            .Key("time");
+        WriteTime(json, value.timestamp);
+        json.Key("aggregates");
+        if (value.aggregateCount > 0) {
+            WriteAggregates(json, value);
+        } else {
+            json.Null();
+        }
+        json.EndObject();
+    }
+    json.EndArray().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderWrites(const std::vector<WriteEntry>& writes) {
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject().Key("written").BeginArray();
+    for (const auto& write : writes) {
+        out.text += "wrote " + std::to_string(write.samples) +
+                    (write.samples == 1 ? " sample to " : " samples to ") + write.path + " (" +
+                    TypeName(write.type) + ")\n";
+        json.BeginObject()
+            .Key("path")
+            .String(write.path)
+            .Key("type")
+            .String(TypeName(write.type))
+            .Key("samples")
+            .Integer(static_cast<int64_t>(write.samples))
+            .EndObject();
+    }
+    json.EndArray().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderCreated(const TagEntry& tag) {
+    JsonWriter json;
+    json.BeginObject()
+        .Key("path")
+        .String(tag.path)
+        .Key("type")
+        .String(TypeName(tag.type))
+        .EndObject();
+    return {"created " + tag.path + " (" + TypeName(tag.type) + ")\n", json.Text()};
+}
+
+Rendered RenderKeywords(const std::string& path, const std::vector<std::string>& keywords) {
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject().Key("path").String(path).Key("keywords").BeginArray();
+    for (const auto& keyword : keywords) {
+        out.text += keyword + "\n";
+        json.String(keyword);
+    }
+    json.EndArray().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderProperties(const std::string& path,
+                          std::vector<std::pair<std::string, std::string>> properties) {
+    std::sort(properties.begin(), properties.end());
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject().Key("path").String(path).Key("properties").BeginObject();
+    for (const auto& [key, value] : properties) {
+        out.text += key + "=" + value + "\n";
+        json.Key(key).String(value);
+    }
+    json.EndObject().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderAggregates(const AggregatesReport& report) {
+    Rendered out;
+    out.text = report.path + "\t" + TypeName(report.type) + "\tcollect " +
+               (report.collect ? "on" : "off") + "\t" + AggregatesText(report.value) + "\n";
+    JsonWriter json;
+    json.BeginObject()
+        .Key("path")
+        .String(report.path)
+        .Key("type")
+        .String(TypeName(report.type))
+        .Key("collect")
+        .Bool(report.collect)
+        .Key("aggregates");
+    WriteAggregates(json, report.value);
+    json.EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+Rendered RenderDeleted(const std::vector<std::string>& paths) {
+    Rendered out;
+    JsonWriter json;
+    json.BeginObject().Key("deleted").BeginArray();
+    for (const auto& path : paths) {
+        out.text += "deleted " + path + "\n";
+        json.String(path);
+    }
+    json.EndArray().EndObject();
+    out.json = json.Text();
+    return out;
+}
+
+std::string JsonSuccess(const std::string& command, const std::string& resultJson) {
+    JsonWriter json;
+    json.BeginObject()
+        .Key("ok")
+        .Bool(true)
+        .Key("command")
+        .String(command)
+        .Key("result")
+        .Raw(resultJson)
+        .EndObject();
+    return json.Text();
+}
+
+std::string JsonFailure(const std::string& command, const std::string& kind, const int32_t* status,
+                        const std::string& message) {
+    JsonWriter json;
+    json.BeginObject()
+        .Key("ok")
+        .Bool(false)
+        .Key("command")
+        .String(command)
+        .Key("error")
+        .BeginObject()
+        .Key("kind")
+        .String(kind)
+        .Key("status");
+    if (status) {
+        json.Integer(*status);
+    } else {
+        json.Null();
+    }
+    json.Key("message").String(message).EndObject().EndObject();
+    return json.Text();
+}
+
+}  // namespace kvtag

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+namespace kvtag {
+
+// The text to send for a value of a tag of `type`, or nothing when a tag of
+// that type cannot hold it. double: a decimal or exponent number, or nan /
+// inf; int32: a decimal integer within 32 bits; uint64: decimal digits within
+// 64 bits; bool: true/false (any case) or 1/0, sent as "True" / "False";
+// datetime: an ISO 8601 time with a zone, sent as UTC with microseconds;
+// string: anything without a zero byte. Numbers go out as given.
+std::optional<std::string> NormalizeValue(int32_t type, const std::string& text);
+
+}  // namespace kvtag
