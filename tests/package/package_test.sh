@@ -149,8 +149,9 @@ only libkvveldra-tag-dev "usr/${INCLUDEDIR//./\\.}/kvveldra/[A-Za-z]+\.h|${lib//
 expect kvveldra-tools -rwxr-xr-x "usr/$BINDIR/kvveldra-tagservice"
 if [ "$EXPECT_KVTAG" = 1 ]; then
     expect kvveldra-tools -rwxr-xr-x "usr/$BINDIR/kvtag"
+    expect kvveldra-tools -rw-r--r-- "usr/share/man/man1/kvtag.1.gz"
 fi
-only kvveldra-tools "usr/${BINDIR//./\\.}/(kvveldra-tagservice|kvtag)|usr/share/man/man[1-8]/[^/]+"
+only kvveldra-tools "usr/${BINDIR//./\\.}/(kvveldra-tagservice|kvtag)|usr/share/man/man[1-8]/[^/]+\\.gz"
 
 # ---------------------------------------------------------------- unpacked
 for name in "${!deb[@]}"; do
@@ -176,6 +177,10 @@ env -u LD_LIBRARY_PATH "$service" --help >"$logs/service-help" 2>&1 ||
     fail_log "$logs/service-help" "kvveldra-tagservice --help did not succeed"
 grep -q -- '--help' "$logs/service-help" ||
     fail_log "$logs/service-help" "kvveldra-tagservice --help printed no usage"
+if [ "$EXPECT_KVTAG" = 1 ]; then
+    env -u LD_LIBRARY_PATH "$usr/$BINDIR/kvtag" --help >"$logs/kvtag-help" 2>&1 ||
+        fail_log "$logs/kvtag-help" "kvtag --help did not succeed from the unpacked root"
+fi
 service_runpath=$(dynamic RUNPATH "$service")
 [ -n "$service_runpath" ] || service_runpath=$(dynamic RPATH "$service")
 [ -f "${service_runpath/\$ORIGIN/$usr/$BINDIR}/libkvsslinit.so.13" ] ||

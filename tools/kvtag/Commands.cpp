@@ -128,28 +128,20 @@ Rendered WriteBatches(const Invocation& call, const ConsoleInstance& instance,
 }
 
 Rendered List(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
-    const std::vector<std::string> search{call.paths.front()};
     TagConsoleProperties properties;
     for (const auto& [key, value] : call.properties) properties[key] = value;
-    std::vector<int32_t> types;
-    std::vector<std::string> paths;
-    std::vector<uint32_t> references;
-    uint32_t total = 0;
-    std::string error;
-    const int32_t status =
-        TagConsoleListTag(instance.Id(), &search, &properties, &call.keywords, call.skip, call.take,
-                          true, instance.Verbose(), &types, &paths, &references, &total, &error);
-    for (const uint32_t reference : references) opened.Add(reference);
-    Check("list " + call.paths.front(), status, error);
+    const Listing listing = ListTags(instance, "list " + call.paths.front(), call.paths.front(),
+                                     properties, call.keywords, call.skip, call.take, opened);
     ListReport report;
-    report.total = total;
+    report.total = listing.total;
     report.skip = call.skip;
     report.take = call.take;
-    for (std::size_t i = 0; i < paths.size() && i < types.size(); ++i) {
-        report.tags.push_back({paths[i], types[i]});
+    for (std::size_t i = 0; i < listing.paths.size(); ++i) {
+        report.tags.push_back({listing.paths[i], listing.types[i]});
     }
-    if (!call.global.json && report.tags.size() < total) {
-        std::fprintf(stderr, "kvtag: %zu of %u matching tags shown\n", report.tags.size(), total);
+    if (!call.global.json && report.tags.size() < listing.total) {
+        std::fprintf(stderr, "kvtag: %zu of %u matching tags shown\n", report.tags.size(),
+                     listing.total);
     }
     return RenderList(report);
 }

@@ -2,6 +2,7 @@
 
 #include <kvveldra/TagConsole.h>
 
+#include <algorithm>
 #include <cstdio>
 
 #include "Failures.h"
@@ -63,25 +64,38 @@ OpenedTags::~OpenedTags() {
     }
 }
 
-std::optional<FoundTag> FindTag(const ConsoleInstance& instance, const std::string& path,
-                                OpenedTags& opened) {
-    const std::vector<std::string> search{path};
-    const TagConsoleProperties noProperties;
-    const std::vector<std::string> noKeywords;
-    std::vector<int32_t> types;
-    std::vector<std::string> paths;
+Listing ListTags(const ConsoleInstance& instance, const std::string& operation,
+                 const std::string& pattern, const TagConsoleProperties& properties,
+                 const std::vector<std::string>& keywords, uint32_t skip, uint32_t take,
+                 OpenedTags& opened) {
+    const std::vector<std::string> search{pattern};
+    Listing listing;
     std::vector<uint32_t> references;
-    uint32_t total = 0;
     std::string error;
-    const int32_t status =
-        TagConsoleListTag(instance.Id(), &search, &noProperties, &noKeywords, 0, 0, true,
-                          instance.Verbose(), &types, &paths, &references, &total, &error);
+    const int32_t status = TagConsoleListTag(instance.Id(), &search, &properties, &keywords, skip,
+                                             take, true, instance.Verbose(), &listing.types,
+                                             &listing.paths, &references, &listing.total, &error);
     // Every listed tag is open now, whatever happens next.
     for (const uint32_t reference : references) opened.Add(reference);
-    Check("look up " + path, status, error);
+    Check(operation, status, error);
+    // A record needs its path, type and reference alike.
+    const std::size_t complete =
+        std::min({listing.paths.size(), listing.types.size(), references.size()});
+    listing.paths.resize(complete);
+    listing.types.resize(complete);
+    listing.references = std::move(references);
+    listing.references.resize(complete);
+    return listing;
+}
+
+std::optional<FoundTag> FindTag(const ConsoleInstance& instance, const std::string& path,
+                                OpenedTags& opened) {
+    const Listing listing = ListTags(instance, "look up " + path, path, {}, {}, 0, 0, opened);
     std::optional<FoundTag> found;
-    for (std::size_t i = 0; i < paths.size() && i < references.size() && i < types.size(); ++i) {
-        if (paths[i] == path) found = FoundTag{paths[i], types[i], references[i]};
+    for (std::size_t i = 0; i < listing.paths.size(); ++i) {
+        if (listing.paths[i] == path) {
+            found = FoundTag{listing.paths[i], listing.types[i], listing.references[i]};
+        }
     }
     return found;
 }

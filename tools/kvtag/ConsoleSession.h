@@ -5,6 +5,8 @@
 #include <string>
 #include <vector>
 
+#include <kvveldra/TagConsole.h>
+
 #include "CommandLine.h"
 
 namespace kvtag {
@@ -66,6 +68,22 @@ struct FoundTag {
     int32_t type = -1;
     uint32_t reference = 0;
 };
+
+// What a listing found: paths and types in the service's order, and the
+// number of all matches.
+struct Listing {
+    std::vector<std::string> paths;
+    std::vector<int32_t> types;
+    std::vector<uint32_t> references;
+    uint32_t total = 0;
+};
+
+// Lists a page of the tags that match `pattern`; every reference the
+// library opened goes to `opened`, also on failure. Throws LibraryError.
+Listing ListTags(const ConsoleInstance& instance, const std::string& operation,
+                 const std::string& pattern, const TagConsoleProperties& properties,
+                 const std::vector<std::string>& keywords, uint32_t skip, uint32_t take,
+                 OpenedTags& opened);
 
 // Looks up the tag of an exact path without creating it; nothing when the
 // service has no such tag. Throws LibraryError.

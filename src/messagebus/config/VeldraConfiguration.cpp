@@ -1,5 +1,7 @@
 #include "messagebus/config/VeldraConfiguration.h"
 
+#include <boost/lexical_cast.hpp>
+
 #include "errors/VeldraException.h"
 #include "messagelibrary/json/JsonReaders.h"
 #include "messagelibrary/json/JsonWriters.h"
@@ -18,7 +20,14 @@ public:
     explicit ConfigurationReader(const JsonVariant& root) : root_(root) {}
     template <typename T>
     ConfigurationReader& Field(std::string_view key, std::optional<T>& out) {
-        if (!ReadField(out, root_, key)) throw VeldraException(-251004, "Failed to parse: ");
+        // A number written as a text that is no number ("Port": "abc") is as
+        // bad a field as one of the wrong JSON type.
+        bool read = false;
+        try {
+            read = ReadField(out, root_, key);
+        } catch (const boost::bad_lexical_cast&) {
+        }
+        if (!read) throw VeldraException(-251004, "Failed to parse: ");
         return *this;
     }
 

@@ -102,6 +102,7 @@ TEST_F(Configurations, BadFilesGiveTheirErrorsAndKeepWhatWasLoaded) {
     const Case cases[] = {
         {"bad.json", "{\"Id\":", -251005, "Malformed Veldra configuration file '" + bad + "'."},
         {"bad.json", "{\"Id\":\"x\",\"Port\":true}", -251004, "Failed to parse: "},
+        {"bad.json", "{\"Id\":\"x\",\"Port\":\"56x72\"}", -251004, "Failed to parse: "},
         {"bad.json", "{\"Id\":\"x\",\"ConnectionType\":\"master\"}", -251004, "Failed to parse: "},
         {"bad.json", "[1,2]", -251004, "Failed to parse: "},
         {"bad.json", "{\"Id\":\"VELDRA_master\"}", -251013, ""},
