@@ -187,8 +187,10 @@ TEST_F(ManagedServiceTest, AMakeIdleCancelsAGoLiveThatWaitsForTheConfiguration) 
 
 TEST_F(ManagedServiceTest, WithAnEmptyOwnGuidAnyGoLiveIsTaken) {
     options_.serviceGuid = std::string();
+    // This time the manager answers the registration with the configuration.
+    serviceManager_->AnswerRegistrationsWith({});
     RunManaged();
-    Configure();
+    ASSERT_TRUE(service_->AwaitConfiguration(kWait));
     serviceManager_->SendGoLive(Control(), std::string("whatever-guid"));
     ASSERT_TRUE(Broadcast(ServiceState::Live));
     EXPECT_TRUE(service_->Log()->AwaitLine("INFO", " ServiceGuid=<empty>", kWait));
