@@ -23,6 +23,10 @@ void ConsoleTraceLogger::Log(const MessageBus::TracePoint& point, const std::str
     if (point.enabled) WriteLogLine(std::cerr, point.name + " | " + text);
 }
 
+void ConsoleTraceLogger::Info(const std::string& text) {
+    WriteLogLine(std::cerr, text);
+}
+
 void ConsoleTraceLogger::Error(const std::string& text) {
     WriteLogLine(std::cerr, "ERROR " + text);
 }

@@ -41,6 +41,8 @@ ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
             options.configurationId = value();
         } else if (arg == "--store") {
             options.storeFile = value();
+        } else if (arg == "--service-guid") {
+            options.serviceGuid = value();
         } else if (arg == "--connect-timeout") {
             options.connectTimeoutMs = ParseTimeout(value());
         } else {
@@ -53,7 +55,7 @@ ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
 std::string UsageText() {
     return std::string(
                "Usage: kvveldra-tagservice [--config ID] [--store FILE] [--verbose]\n"
-               "                           [--connect-timeout MS] [--help]\n"
+               "                           [--connect-timeout MS] [--service-guid GUID] [--help]\n"
                "\n"
                "Serves the TagInfo, TagCurrentValue and TagIngestion messages on the bus.\n"
                "\n"
@@ -65,15 +67,23 @@ std::string UsageText() {
                "                        without it they live in memory only\n"
                "  --verbose             one line on standard output per message handled\n"
                "  --connect-timeout MS  how long the first connection may take (default 10000)\n"
+               "  --service-guid GUID   run under the service manager of this node with this\n"
+               "                        GUID (as does a non-empty VELDRA_SERVICEGUID): register\n"
+               "                        on ServiceManager_<node>, take the configuration, and\n"
+               "                        serve only once told to go live\n"
                "  --help                this text\n"
                "\n"
                "Once its consumers are started it prints the line\n"
                "  ") +
            kReadyLine +
            " (queue NAME, store memory|FILE)\n"
-           "on standard output. SIGINT or SIGTERM stop it cleanly with status 0.\n"
-           "Exit status: 0 stopped by a signal, 1 bad arguments, 2 no broker or no\n"
-           "configuration, 3 the store cannot be opened.\n";
+           "on standard output; under a manager it first prints\n"
+           "  " + std::string(kManagedLine) + " (control queue NAME, service guid GUID)\n"
+           "and the ready line each time it goes live. SIGINT or SIGTERM, or the\n"
+           "manager's shutdown, stop it cleanly with status 0. VELDRA_SERVICE_GROUP_NAME\n"
+           "names its service group (default Default).\n"
+           "Exit status: 0 stopped by a signal or the manager, 1 bad arguments, 2 no\n"
+           "broker or no configuration, 3 the store cannot be opened.\n";
 }
 
 }  // namespace Korvane::Veldra::TagService

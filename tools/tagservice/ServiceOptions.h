@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -13,7 +14,13 @@ struct ServiceOptions {
     bool verbose = false;                            // --verbose
     bool help = false;                               // --help
     int32_t connectTimeoutMs = 10000;                // --connect-timeout MS
+    // --service-guid GUID: run under a service manager with this GUID, in
+    // place of VELDRA_SERVICEGUID.
+    std::optional<std::string> serviceGuid;
 };
+
+// The line printed on standard output once a managed service has registered.
+inline constexpr const char* kManagedLine = "kvveldra-tagservice managed";
 
 // The line printed on standard output once the service serves.
 inline constexpr const char* kReadyLine = "kvveldra-tagservice ready";

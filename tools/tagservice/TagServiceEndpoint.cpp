@@ -42,7 +42,8 @@ private:
 }  // namespace
 
 TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager,
-                                       TagServiceLogic& logic, bool verbose)
+                                       TagServiceLogic& logic, bool verbose,
+                                       bool startConsuming)
     : logic_(logic), verbose_(verbose), service_(SettingsOn(manager)) {
     service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
     service_.SetDefaultResponseCallback(std::make_shared<Handler>(
@@ -53,7 +54,7 @@ TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manage
                                       VeldraMessageLibrary::kTagIngestionService}) {
         service_.Subscriber()->Bind({target, "#"});
     }
-    service_.Subscriber()->StartConsuming();
+    if (startConsuming) service_.Subscriber()->StartConsuming();
 }
 
 TagServiceEndpoint::~TagServiceEndpoint() {

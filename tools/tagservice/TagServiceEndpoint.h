@@ -19,16 +19,18 @@ namespace Korvane::Veldra::TagService {
 // logged, a message of an unknown name with "Veldra.NotSupported". Messages are handled one at a time, on the bus's handling thread.
 class TagServiceEndpoint {
 public:
-    // Connects, declares and binds the queue and starts consuming; throws
-    // when the broker cannot be reached.
+    // Connects, declares and binds the queue and, with startConsuming, starts
+    // consuming; throws when the broker cannot be reached. Without it the
+    // queue fills until someone starts Subscriber().
     TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager, TagServiceLogic& logic,
-                       bool verbose);
+                       bool verbose, bool startConsuming = true);
     // Stops consuming, then closes the service's channels.
     ~TagServiceEndpoint();
     TagServiceEndpoint(const TagServiceEndpoint&) = delete;
     TagServiceEndpoint& operator=(const TagServiceEndpoint&) = delete;
 
     const std::string& QueueName() const { return service_.QueueName(); }
+    MessageBus::MessageSubscriber* Subscriber() const { return service_.Subscriber(); }
 
 private:
     using Received = MessageBus::GenericMessage;

@@ -12,9 +12,13 @@
 #include "ServiceOptions.h"
 #include "SqliteTagStore.h"
 #include "StatusLinePump.h"
+#include "StopSignalWaiter.h"
 #include "TagServiceEndpoint.h"
+#include "TagServiceHost.h"
 #include "errors/VeldraException.h"
+#include "messagebus/concurrency/Semaphore.h"
 #include "messagebus/config/BusConfigurations.h"
+#include "utilities/ServiceEnvironment.h"
 
 namespace {
 
@@ -25,8 +29,10 @@ constexpr int kBadArguments = 1;
 constexpr int kNoBroker = 2;
 constexpr int kNoStore = 3;
 
+constexpr const char* kServiceName = "TagService";
+
 // SIGINT and SIGTERM, blocked in every thread (the bus threads inherit the
-// mask), so that only the main thread's sigwait sees them.
+// mask), so that only the StopSignalWaiter's sigwait sees them.
 sigset_t BlockStopSignals() {
     sigset_t signals;
     sigemptyset(&signals);
@@ -56,8 +62,22 @@ std::unique_ptr<MessageBus::AmqpConnectionManager> ManagerFor(
     return manager;
 }
 
+// Standalone unless a service GUID is given, by option or by environment.
+VeldraUtilities::ManagedServiceOptions HostOptions(const TagService::ServiceOptions& options,
+                                                   MessageBus::AmqpConnectionManager& manager) {
+    VeldraUtilities::ManagedServiceOptions host;
+    host.serviceName = kServiceName;
+    host.connectionManager = &manager;
+    host.serviceGuid = options.serviceGuid;
+    host.standalone = options.serviceGuid.value_or(VeldraUtilities::GetServiceGuid()).empty();
+    host.echoLogger = std::make_shared<TagService::ConsoleTraceLogger>();
+    return host;
+}
+
 int Run(const TagService::ServiceOptions& options) {
     const sigset_t stopSignals = BlockStopSignals();
+    MessageBus::Semaphore shutdownEvent;
+    TagService::StopSignalWaiter signals(stopSignals, shutdownEvent);
 
     std::unique_ptr<TagService::TagStore> store;
     try {
@@ -71,12 +91,26 @@ int Run(const TagService::ServiceOptions& options) {
     std::unique_ptr<MessageBus::AmqpConnectionManager> manager;
     std::unique_ptr<TagService::StatusLinePump> statusLines;
     std::unique_ptr<TagService::TagServiceEndpoint> endpoint;
+    std::unique_ptr<TagService::TagServiceHost> host;
     std::string broker;
     try {
         manager = ManagerFor(options, broker);
         statusLines = std::make_unique<TagService::StatusLinePump>(*manager);
+        // The host starts the consumers when it goes live.
         endpoint = std::make_unique<TagService::TagServiceEndpoint>(*manager, logic,
-                                                                    options.verbose);
+                                                                    options.verbose, false);
+        host = std::make_unique<TagService::TagServiceHost>(
+            &shutdownEvent, *endpoint,
+            std::string(TagService::kReadyLine) + " (queue " + endpoint->QueueName() +
+                ", store " +
+                (options.storeFile.empty() ? std::string("memory") : options.storeFile) + ")");
+        const VeldraUtilities::ManagedServiceOptions hostOptions = HostOptions(options, *manager);
+        host->Run(hostOptions);
+        if (!hostOptions.standalone) {
+            std::cout << TagService::kManagedLine << " (control queue "
+                      << host->GetControlQueueName() << ", service guid " << host->ServiceGuid()
+                      << ")" << std::endl;
+        }
     } catch (const MessageBus::VeldraException* error) {
         const std::unique_ptr<const MessageBus::VeldraException> owned(error);
         WriteLogLine(std::cerr, std::string("no broker configuration: ") + error->what());
@@ -88,14 +122,15 @@ int Run(const TagService::ServiceOptions& options) {
         return kNoBroker;
     }
 
-    std::cout << TagService::kReadyLine << " (queue " << endpoint->QueueName() << ", store "
-              << (options.storeFile.empty() ? std::string("memory") : options.storeFile) << ")"
-              << std::endl;
-
-    int signal = 0;
-    while (sigwait(&stopSignals, &signal) != 0) {
+    shutdownEvent.Wait();
+    if (const int signal = signals.Received()) {
+        WriteLogLine(std::cerr,
+                     std::string("stopping on ") + (signal == SIGINT ? "SIGINT" : "SIGTERM"));
+        host->SetState(VeldraMessageLibrary::ServiceState::Stopped);
+    } else {
+        WriteLogLine(std::cerr, "stopping on the manager's shutdown");
     }
-    WriteLogLine(std::cerr, std::string("stopping on ") + (signal == SIGINT ? "SIGINT" : "SIGTERM"));
+    host.reset();
     endpoint.reset();
     statusLines.reset();
     manager.reset();

@@ -133,7 +133,8 @@ TagServiceProcess::TagServiceProcess(Options options) {
         throw std::runtime_error(std::string("fork: ") + std::strerror(errno));
     }
     reader_ = std::thread([this, fd = pipeFds[0]] { ReadOutput(fd); });
-    if (!WaitForOutput(kReadyLine, kReadyTimeout)) {
+    const std::string readyLine = options.readyLine.empty() ? kReadyLine : options.readyLine;
+    if (!WaitForOutput(readyLine, kReadyTimeout)) {
         Kill();
         reader_.join();  // the output ends with the child
         throw std::runtime_error("kvveldra-tagservice did not print its ready line; its output:\n" +

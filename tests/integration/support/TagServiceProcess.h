@@ -31,6 +31,7 @@ struct TagServiceOptions {
     bool verbose = false;           // --verbose
     std::string dataRoot;           // VELDRA_DATA_DIR of the child; empty: UseBrokerDataRoot()
     std::vector<std::string> extraArgs;
+    std::string readyLine;          // the line to wait for; empty: the ready line
 };
 
 // A kvveldra-tagservice child process with its standard output and standard
@@ -40,7 +41,8 @@ public:
     using Options = TagServiceOptions;
 
     // Starts kvveldra-tagservice and returns once it serves: it prints its
-    // ready line after its consumers are started. Throws std::runtime_error
+    // ready line after its consumers are started (or once it printed
+    // Options::readyLine, when that is given). Throws std::runtime_error
     // with the child's output when the line does not come within 30 seconds
     // or the child ends first.
     explicit TagServiceProcess(Options options = {});

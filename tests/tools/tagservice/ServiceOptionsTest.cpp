@@ -12,15 +12,17 @@ TEST(ServiceOptionsTest, DefaultsAndEveryOption) {
     EXPECT_EQ(defaults.configurationId, "veldra_master");
     EXPECT_TRUE(defaults.storeFile.empty());
     EXPECT_FALSE(defaults.verbose);
+    EXPECT_FALSE(defaults.serviceGuid);
 
     const ServiceOptions all = ParseServiceOptions(
         {"--config", "veldra_localhost", "--store", "/x/t.db", "--verbose", "--connect-timeout",
-         "2500", "--help"});
+         "2500", "--service-guid", "9d1e", "--help"});
     EXPECT_EQ(all.configurationId, "veldra_localhost");
     EXPECT_EQ(all.storeFile, "/x/t.db");
     EXPECT_TRUE(all.verbose);
     EXPECT_TRUE(all.help);
     EXPECT_EQ(all.connectTimeoutMs, 2500);
+    EXPECT_EQ(all.serviceGuid, "9d1e");
 }
 
 TEST(ServiceOptionsTest, BadArgumentsAreRefusedByName) {
@@ -29,6 +31,7 @@ TEST(ServiceOptionsTest, BadArgumentsAreRefusedByName) {
                                                {"--config", ""},
                                                {"--connect-timeout", "0"},
                                                {"--connect-timeout", "12x"},
+                                               {"--service-guid"},
                                                {"--storage", "f"}}) {
         try {
             ParseServiceOptions(args);

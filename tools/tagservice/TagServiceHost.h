@@ -1,0 +1,27 @@
+#pragma once
+
+#include <string>
+
+#include "TagServiceEndpoint.h"
+#include "messagebus/concurrency/Semaphore.h"
+#include "utilities/managedservice/ManagedServiceBase.h"
+
+namespace Korvane::Veldra::TagService {
+
+// The tag service as a managed service: the endpoint's consumers are its work
+// subscribers, started on going live and stopped on going idle. Each time it
+// goes live it prints the ready line on standard output.
+class TagServiceHost : public VeldraUtilities::ManagedServiceBase {
+public:
+    // The endpoint must outlive the host.
+    TagServiceHost(MessageBus::Semaphore* shutdownEvent, TagServiceEndpoint& endpoint,
+                   std::string readyText);
+    ~TagServiceHost() override;
+
+    void GoLive() override;
+
+private:
+    const std::string readyText_;
+};
+
+}  // namespace Korvane::Veldra::TagService
