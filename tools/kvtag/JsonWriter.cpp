@@ -65,31 +65,23 @@ void JsonWriter::BeforeValue() {
     }
 }
 
-JsonWriter& JsonWriter::BeginObject() {
+JsonWriter& JsonWriter::Open(char bracket) {
     BeforeValue();
-    text_ += '{';
+    text_ += bracket;
     first_.push_back(true);
     return *this;
 }
 
-JsonWriter& JsonWriter::EndObject() {
-    text_ += '}';
+JsonWriter& JsonWriter::Close(char bracket) {
+    text_ += bracket;
     first_.pop_back();
     return *this;
 }
 
-JsonWriter& JsonWriter::BeginArray() {
-    BeforeValue();
-    text_ += '[';
-    first_.push_back(true);
-    return *this;
-}
-
-JsonWriter& JsonWriter::EndArray() {
-    text_ += ']';
-    first_.pop_back();
-    return *this;
-}
+JsonWriter& JsonWriter::BeginObject() { return Open('{'); }
+JsonWriter& JsonWriter::EndObject() { return Close('}'); }
+JsonWriter& JsonWriter::BeginArray() { return Open('['); }
+JsonWriter& JsonWriter::EndArray() { return Close(']'); }
 
 JsonWriter& JsonWriter::Key(std::string_view key) {
     BeforeValue();
@@ -99,41 +91,19 @@ JsonWriter& JsonWriter::Key(std::string_view key) {
     return *this;
 }
 
-JsonWriter& JsonWriter::String(std::string_view text) {
-    BeforeValue();
-    text_ += JsonQuote(text);
-    return *this;
-}
-
-JsonWriter& JsonWriter::Integer(int64_t value) {
-    BeforeValue();
-    text_ += std::to_string(value);
-    return *this;
-}
-
-JsonWriter& JsonWriter::Number(double value) {
-    if (!std::isfinite(value)) return Null();
-    BeforeValue();
-    text_ += NumberText(value);
-    return *this;
-}
-
-JsonWriter& JsonWriter::Bool(bool value) {
-    BeforeValue();
-    text_ += value ? "true" : "false";
-    return *this;
-}
-
-JsonWriter& JsonWriter::Null() {
-    BeforeValue();
-    text_ += "null";
-    return *this;
-}
-
-JsonWriter& JsonWriter::Raw(std::string_view json) {
+JsonWriter& JsonWriter::Value(std::string_view json) {
     BeforeValue();
     text_ += json;
     return *this;
 }
+
+JsonWriter& JsonWriter::String(std::string_view text) { return Value(JsonQuote(text)); }
+JsonWriter& JsonWriter::Integer(int64_t value) { return Value(std::to_string(value)); }
+JsonWriter& JsonWriter::Number(double value) {
+    return std::isfinite(value) ? Value(NumberText(value)) : Null();
+}
+JsonWriter& JsonWriter::Bool(bool value) { return Value(value ? "true" : "false"); }
+JsonWriter& JsonWriter::Null() { return Value("null"); }
+JsonWriter& JsonWriter::Raw(std::string_view json) { return Value(json); }
 
 }  // namespace kvtag

@@ -28,6 +28,10 @@ public:
 
 private:
     void BeforeValue();
+    // A value in its JSON form, after the comma it needs.
+    JsonWriter& Value(std::string_view json);
+    JsonWriter& Open(char bracket);
+    JsonWriter& Close(char bracket);
 
     std::string text_;
     std::vector<bool> first_;  // per open container: no member yet

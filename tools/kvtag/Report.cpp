@@ -18,6 +18,11 @@ void WriteTime(JsonWriter& json, TagConsoleTime time) {
     }
 }
 
+// The two members every tag's object starts with.
+JsonWriter& WritePathAndType(JsonWriter& json, const std::string& path, int32_t type) {
+    return json.Key("path").String(path).Key("type").String(TypeName(type));
+}
+
 std::string TimeOrDash(TagConsoleTime time) {
     const std::string text = FormatIsoTime(time);
     return text.empty() ? "-" : text;
@@ -58,12 +63,7 @@ Rendered RenderList(const ListReport& report) {
         .BeginArray();
     for (const auto& tag : report.tags) {
         out.text += tag.path + "\t" + TypeName(tag.type) + "\n";
-        json.BeginObject()
-            .Key("path")
-            .String(tag.path)
-            .Key("type")
-            .String(TypeName(tag.type))
-            .EndObject();
+        WritePathAndType(json.BeginObject(), tag.path, tag.type).EndObject();
     }
     json.EndArray().EndObject();
     out.json = json.Text();
@@ -79,11 +79,7 @@ Rendered RenderValues(const std::vector<TagConsoleValue>& values) {
                     TimeOrDash(value.timestamp);
         if (value.aggregateCount > 0) out.text += "\t(" + AggregatesText(value) + ")";
         out.text += "\n";
-        json.BeginObject()
-            .Key("path")
-            .String(value.path)
-            .Key("type")
-            .String(TypeName(value.dataType))
+        WritePathAndType(json.BeginObject(), value.path, value.dataType)
             .Key("value")
             .String(value.value)
             .Key("time");
@@ -109,11 +105,7 @@ Rendered RenderWrites(const std::vector<WriteEntry>& writes) {
         out.text += "wrote " + std::to_string(write.samples) +
                     (write.samples == 1 ? " sample to " : " samples to ") + write.path + " (" +
                     TypeName(write.type) + ")\n";
-        json.BeginObject()
-            .Key("path")
-            .String(write.path)
-            .Key("type")
-            .String(TypeName(write.type))
+        WritePathAndType(json.BeginObject(), write.path, write.type)
             .Key("samples")
             .Integer(static_cast<int64_t>(write.samples))
             .EndObject();
@@ -125,12 +117,7 @@ Rendered RenderWrites(const std::vector<WriteEntry>& writes) {
 
 Rendered RenderCreated(const TagEntry& tag) {
     JsonWriter json;
-    json.BeginObject()
-        .Key("path")
-        .String(tag.path)
-        .Key("type")
-        .String(TypeName(tag.type))
-        .EndObject();
+    WritePathAndType(json.BeginObject(), tag.path, tag.type).EndObject();
     return {"created " + tag.path + " (" + TypeName(tag.type) + ")\n", json.Text()};
 }
 
@@ -167,11 +154,7 @@ Rendered RenderAggregates(const AggregatesReport& report) {
     out.text = report.path + "\t" + TypeName(report.type) + "\tcollect " +
                (report.collect ? "on" : "off") + "\t" + AggregatesText(report.value) + "\n";
     JsonWriter json;
-    json.BeginObject()
-        .Key("path")
-        .String(report.path)
-        .Key("type")
-        .String(TypeName(report.type))
+    WritePathAndType(json.BeginObject(), report.path, report.type)
         .Key("collect")
         .Bool(report.collect)
         .Key("aggregates");

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "ServiceLog.h"
+#include "messagebus/interfaces/FunctionBroadcastCallback.h"
 #include "messagebus/service/MessageServiceSettings.h"
 #include "messagelibrary/GenericResponse.h"
 #include "messagelibrary/TagServices.h"
@@ -26,19 +27,6 @@ MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager&
     return settings;
 }
 
-// Hands each message of one name to a function.
-class Handler : public MessageBus::Interfaces::IBroadcastCallback {
-public:
-    explicit Handler(std::function<void(const MessageBus::GenericMessage&)> handle)
-        : handle_(std::move(handle)) {}
-    void OnMessage(std::shared_ptr<MessageBus::GenericMessage> message) override {
-        handle_(*message);
-    }
-
-private:
-    std::function<void(const MessageBus::GenericMessage&)> handle_;
-};
-
 }  // namespace
 
 TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager,
@@ -46,7 +34,7 @@ TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manage
                                        bool startConsuming)
     : logic_(logic), verbose_(verbose), service_(SettingsOn(manager)) {
     service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
-    service_.SetDefaultResponseCallback(std::make_shared<Handler>(
+    service_.SetDefaultResponseCallback(std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
         [this](const Received& received) { Unhandled(received); }));
     RegisterHandlers();
     for (const std::string& target : {VeldraMessageLibrary::kTagInfoService,
@@ -102,7 +90,7 @@ void TagServiceEndpoint::RegisterHandlers() {
 void TagServiceEndpoint::On(const std::string& messageName,
                             std::function<void(const Received&)> handle) {
     service_.Subscriber()->RegisterMessageCallback(
-        messageName, std::make_shared<Handler>(std::move(handle)), false);
+        messageName, std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(std::move(handle)), false);
 }
 
 template <typename Message>

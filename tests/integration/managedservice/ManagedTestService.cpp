@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "messagebus/BusTestSupport.h"
+#include "messagebus/interfaces/FunctionBroadcastCallback.h"
 #include "messagebus/service/MessageSubscriberBuilder.h"
 
 namespace Korvane::Veldra::Testing {
@@ -53,21 +54,6 @@ std::vector<std::string> RecordingTraceLogger::Lines() const {
 
 // ---- ManagedTestService ----
 
-class ManagedTestService::WorkCallback : public MessageBus::Interfaces::IBroadcastCallback {
-public:
-    explicit WorkCallback(ManagedTestService* service) : service_(service) {}
-    void OnMessage(std::shared_ptr<MessageBus::GenericMessage> message) override {
-        {
-            std::lock_guard<std::mutex> lock(service_->mutex_);
-            service_->workSeen_.push_back(message->CorrelationId());
-        }
-        service_->changed_.notify_all();
-    }
-
-private:
-    ManagedTestService* const service_;
-};
-
 ManagedTestService::ManagedTestService(MessageBus::Semaphore* shutdownEvent,
                                        MessageBus::AmqpConnectionManager& manager)
     : ManagedServiceBase(shutdownEvent), workQueue_(UniqueQueueName("ManagedWork")) {
@@ -75,7 +61,14 @@ ManagedTestService::ManagedTestService(MessageBus::Semaphore* shutdownEvent,
     builder.AutoStart = false;
     builder.BindAll = true;
     builder.ConnectionManager = &manager;
-    builder.DefaultCallback = std::make_shared<WorkCallback>(this);
+    builder.DefaultCallback = std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
+        [this](const MessageBus::GenericMessage& message) {
+            {
+                std::lock_guard<std::mutex> lock(mutex_);
+                workSeen_.push_back(message.CorrelationId());
+            }
+            changed_.notify_all();
+        });
     work_ = std::make_unique<MessageBus::MessageSubscriber>(builder);
     AddWorkSubscriber(work_.get());
 }

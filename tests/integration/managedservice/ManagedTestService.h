@@ -62,7 +62,6 @@ public:
     const std::shared_ptr<RecordingTraceLogger>& Log() const { return log_; }
 
 private:
-    class WorkCallback;
 
     std::mutex mutex_;
     std::condition_variable changed_;

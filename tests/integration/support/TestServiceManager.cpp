@@ -3,6 +3,7 @@
 #include <functional>
 #include <utility>
 
+#include "messagebus/interfaces/FunctionBroadcastCallback.h"
 #include "messagebus/service/MessageServiceSettings.h"
 #include "messagelibrary/audit/AuditAddRoutedMessage.h"
 #include "messagelibrary/audit/AuditTrailService.h"
@@ -47,19 +48,6 @@ public:
 
 }  // namespace
 
-// Hands each message of one name to a member function.
-class TestServiceManager::Recorder : public MessageBus::Interfaces::IBroadcastCallback {
-public:
-    explicit Recorder(std::function<void(const MessageBus::GenericMessage&)> record)
-        : record_(std::move(record)) {}
-    void OnMessage(std::shared_ptr<MessageBus::GenericMessage> message) override {
-        record_(*message);
-    }
-
-private:
-    std::function<void(const MessageBus::GenericMessage&)> record_;
-};
-
 TestServiceManager::TestServiceManager(MessageBus::AmqpConnectionManager& manager) {
     MessageBus::MessageServiceSettings settings;
     // Its queue is ServiceManager_<node>, where services register.
@@ -70,7 +58,7 @@ TestServiceManager::TestServiceManager(MessageBus::AmqpConnectionManager& manage
     service_ = std::make_unique<MessageBus::MessageService>(settings);
 
     const auto on = [this](void (TestServiceManager::*record)(const MessageBus::GenericMessage&)) {
-        auto handler = std::make_shared<Recorder>(
+        auto handler = std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
             [this, record](const MessageBus::GenericMessage& message) { (this->*record)(message); });
         handlers_.push_back(handler);
         return handler;

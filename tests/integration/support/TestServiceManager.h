@@ -88,8 +88,6 @@ public:
                                 std::chrono::milliseconds timeout);
 
 private:
-    class Recorder;
-
     void OnRegistration(const MessageBus::GenericMessage& message);
     void OnStatus(const MessageBus::GenericMessage& message);
     void OnAudit(const MessageBus::GenericMessage& message);
