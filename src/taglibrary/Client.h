@@ -234,8 +234,16 @@ private:
     // What both send paths share: file the request, send, hand out the
     // time-out, and on failure take the request back out.
     template <typename Send>
-    int32_t FileAndSend(const std::shared_ptr<AsyncRequest>& request, Send send,
+    int32_t FileAndSend(MessageBus::MessageBase& message,
+                        const std::shared_ptr<AsyncRequest>& request, Send send,
                         uint32_t& requestId, uint32_t& timeoutMs, std::string& error);
+    // Before a send: the reply queue must be in place for the reply to come.
+    // 0 when the message may go; else the status and text for the caller.
+    int32_t AwaitReplyRoute(MessageBus::MessageService& service, const AsyncRequest& request,
+                            std::string& error) const;
+    // After a failed send: takes the request back out and drops its
+    // correlation entry.
+    void Forget(uint32_t requestId, const AsyncRequest& request);
     // Stops the logging thread and releases the service, then the logger.
     void ShutdownBus() noexcept;
 

@@ -1,8 +1,13 @@
 // The bus half of the Client: construction and shutdown in their order, the
 // two send paths and the finish step that every operation shares.
+#include <amqp.h>
+
 #include <algorithm>
+#include <chrono>
 #include <limits>
 
+#include "errors/AmqpException.h"
+#include "errors/ErrorCodes.h"
 #include "messagebus/amqp/AmqpConnectionManager.h"
 #include "messagebus/config/BusConfigurations.h"
 #include "messagebus/service/MessageService.h"
@@ -85,9 +90,33 @@ uint32_t Client::RequestTimeoutMs() const {
                            : MessageBus::MessageServiceSettings().DefaultTimeoutMs;
 }
 
+int32_t Client::AwaitReplyRoute(MessageBus::MessageService& service, const AsyncRequest& request,
+                                std::string& error) const {
+    // Deliberate hardening: after a reconnect the reply queue exists again
+    // only once its consumer has declared and bound it; a reply sent before
+    // that is dropped by the broker. A blocking caller waits for it within
+    // its request's time-out, one that must not block is told at once.
+    if (service.AwaitReplyRoute(request.CallerWaits() ? service.DefaultTimeoutMs() : 0)) return 0;
+    // A lost publisher fails the send itself at once, with its own error.
+    if (service.IsPublisherLost()) return 0;
+    if (request.CallerWaits()) return ReportError("Veldra.RequestTimedOut", error);
+    return ReportException(
+        MessageBus::AmqpException(ErrorCodes::kPublishingMessage,
+                                  "Error publishing message. The reply queue is being declared "
+                                  "and bound again after a reconnect; try again shortly.",
+                                  AMQP_STATUS_CONNECTION_CLOSED),
+        error);
+}
+
 template <typename Send>
-int32_t Client::FileAndSend(const std::shared_ptr<AsyncRequest>& request, Send send,
+int32_t Client::FileAndSend(MessageBus::MessageBase& message,
+                            const std::shared_ptr<AsyncRequest>& request, Send send,
                             uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
+    const auto started = std::chrono::steady_clock::now();
+    // The identity first, so that the request knows its correlation id
+    // before anyone can finish it.
+    message.Headers().EnsureIdentity();
+    request->SetCorrelationId(message.CorrelationId());
     // Filed before the send: the reply cannot come before its request is.
     requestId = requestMap_->Add(request);
     if (requestId == 0) return ReportError("Tag.InvalidState", error);
@@ -96,15 +125,35 @@ int32_t Client::FileAndSend(const std::shared_ptr<AsyncRequest>& request, Send s
             requestMap_->Take(requestId);
             return ReportError("Tag.InvalidState", error);
         }
+        const int32_t routeStatus = AwaitReplyRoute(*messageService_, *request, error);
+        if (routeStatus != 0) {
+            requestMap_->Take(requestId);
+            return routeStatus;
+        }
         send(*messageService_, requestId);
-        timeoutMs = messageService_->DefaultTimeoutMs();
+        // The wait for the reply queue counts in the request's time-out.
+        const auto spent = std::chrono::duration_cast<std::chrono::milliseconds>(
+                               std::chrono::steady_clock::now() - started)
+                               .count();
+        const uint32_t requestTimeoutMs = messageService_->DefaultTimeoutMs();
+        timeoutMs = spent >= int64_t{requestTimeoutMs}
+                        ? 0
+                        : requestTimeoutMs - static_cast<uint32_t>(spent);
         return 0;
     } catch (const MessageBus::VeldraException& exception) {
-        requestMap_->Take(requestId);
+        Forget(requestId, *request);
         return ReportException(exception, error);
     } catch (const std::exception& exception) {
-        requestMap_->Take(requestId);
+        Forget(requestId, *request);
         return ReportUnexpectedException(exception, error);
+    }
+}
+
+void Client::Forget(uint32_t requestId, const AsyncRequest& request) {
+    requestMap_->Take(requestId);
+    // No reply can come for a message that was not sent.
+    if (messageService_) {
+        messageService_->Subscriber()->CorrIdCallbacks()->Erase(request.CorrelationId());
     }
 }
 
@@ -112,7 +161,7 @@ int32_t Client::SendTrackedRequest(MessageBus::MessageBase& message,
                                    const std::shared_ptr<AsyncRequest>& request,
                                    uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
     return FileAndSend(
-        request,
+        message, request,
         [&](MessageBus::MessageService& service, uint32_t state) {
             // The response finds the callback by its message name.
             service.SendRequestAsync(message, state, true);
@@ -124,12 +173,13 @@ int32_t Client::SendTrackedRouted(MessageBus::MessageBase& message,
                                   const std::shared_ptr<AsyncRequest>& request,
                                   uint32_t& requestId, uint32_t& timeoutMs, std::string& error) {
     return FileAndSend(
-        request,
+        message, request,
         [&](MessageBus::MessageService& service, uint32_t state) {
             // The reply, a GenericResponse, goes straight to the callback by
-            // the correlation id: routed messages have no response name.
-            service.Subscriber()->RegisterCorrelationCallback(message.CorrelationId(),
-                                                              responseCallback_, state);
+            // the correlation id: routed messages have no response name. The
+            // entry goes when the request times out.
+            service.Subscriber()->RegisterCorrelationCallback(
+                message.CorrelationId(), responseCallback_, state, service.DefaultTimeoutMs());
             service.SendRouted(message, false);
         },
         requestId, timeoutMs, error);
@@ -139,6 +189,11 @@ int32_t Client::TakeFinishedRequest(uint32_t requestId, std::shared_ptr<AsyncReq
                                     std::string& error) {
     request = requestMap_->Take(requestId);
     if (!request) return ReportError("Tag.InvalidState", error);
+    // A reply that did not come leaves its correlation entry: it ends here,
+    // with its request.
+    if (messageService_ && !request->CorrelationId().empty()) {
+        messageService_->Subscriber()->CorrIdCallbacks()->Erase(request->CorrelationId());
+    }
     return request->CheckResult(*errors_, error);
 }
 

@@ -43,6 +43,8 @@ ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
             options.storeFile = value();
         } else if (arg == "--service-guid") {
             options.serviceGuid = value();
+        } else if (arg == "--durable-queue") {
+            options.durableQueue = value();
         } else if (arg == "--connect-timeout") {
             options.connectTimeoutMs = ParseTimeout(value());
         } else {
@@ -55,7 +57,8 @@ ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
 std::string UsageText() {
     return std::string(
                "Usage: kvveldra-tagservice [--config ID] [--store FILE] [--verbose]\n"
-               "                           [--connect-timeout MS] [--service-guid GUID] [--help]\n"
+               "                           [--connect-timeout MS] [--service-guid GUID]\n"
+               "                           [--durable-queue NAME] [--help]\n"
                "\n"
                "Serves the TagInfo, TagCurrentValue and TagIngestion messages on the bus.\n"
                "\n"
@@ -71,6 +74,10 @@ std::string UsageText() {
                "                        GUID (as does a non-empty VELDRA_SERVICEGUID): register\n"
                "                        on ServiceManager_<node>, take the configuration, and\n"
                "                        serve only once told to go live\n"
+               "  --durable-queue NAME  serve from the durable queue TagService_NAME, which\n"
+               "                        keeps the requests sent while the service reconnects\n"
+               "                        after a restart of the broker node; the default queue\n"
+               "                        is deleted with its last consumer\n"
                "  --help                this text\n"
                "\n"
                "Once its consumers are started it prints the line\n"

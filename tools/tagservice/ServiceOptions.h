@@ -17,6 +17,10 @@ struct ServiceOptions {
     // --service-guid GUID: run under a service manager with this GUID, in
     // place of VELDRA_SERVICEGUID.
     std::optional<std::string> serviceGuid;
+    // --durable-queue NAME: serve from the durable queue TagService_NAME,
+    // which outlives the service and a restart of the broker node; empty: an
+    // auto-deleted queue of a new name each run.
+    std::string durableQueue;
 };
 
 // The line printed on standard output once a managed service has registered.

@@ -6,6 +6,8 @@
 #include "ServiceLog.h"
 #include "messagebus/interfaces/FunctionBroadcastCallback.h"
 #include "messagebus/service/MessageServiceSettings.h"
+#include "messagebus/service/MessageSubscriberBuilder.h"
+#include "messagebus/service/ServiceQueueName.h"
 #include "messagelibrary/GenericResponse.h"
 #include "messagelibrary/TagServices.h"
 #include "messagelibrary/tagcurrentvalue/TagCvQueryCurrentValuesByPathResponse.h"
@@ -18,12 +20,32 @@ namespace {
 
 using MessageBus::MessageError;
 
-MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager& manager) {
+constexpr const char* kServiceName = "TagService";
+
+// The subscriber of a durable queue: bound to its own name as an ordinary
+// service queue is, kept by the broker across restarts of the node, so that
+// requests sent while the service reconnects wait for it.
+MessageBus::MessageSubscriberBuilder DurableBuilder(const std::string& durableQueue) {
+    MessageBus::MessageSubscriberBuilder builder(
+        MessageBus::ServiceQueueName(kServiceName, durableQueue));
+    builder.BindAll = true;
+    builder.AutoStart = false;
+    builder.Durable = true;
+    return builder;
+}
+
+MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager& manager,
+                                              const std::string& durableQueue,
+                                              const MessageBus::MessageSubscriberBuilder& durable) {
     MessageBus::MessageServiceSettings settings;
-    settings.Name = "TagService";
+    settings.Name = kServiceName;
     settings.ConnectionManager = &manager;
     // Consuming starts once every handler is registered and bound.
     settings.AutoStart = false;
+    if (!durableQueue.empty()) {
+        settings.InstanceId = durableQueue;
+        settings.SubscriberBuilder = &durable;
+    }
     return settings;
 }
 
@@ -31,8 +53,10 @@ MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager&
 
 TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager,
                                        TagServiceLogic& logic, bool verbose,
-                                       bool startConsuming)
-    : logic_(logic), verbose_(verbose), service_(SettingsOn(manager)) {
+                                       bool startConsuming, const std::string& durableQueue)
+    : logic_(logic),
+      verbose_(verbose),
+      service_(SettingsOn(manager, durableQueue, DurableBuilder(durableQueue))) {
     service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
     service_.SetDefaultResponseCallback(std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
         [this](const Received& received) { Unhandled(received); }));

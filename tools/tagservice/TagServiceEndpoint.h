@@ -21,9 +21,12 @@ class TagServiceEndpoint {
 public:
     // Connects, declares and binds the queue and, with startConsuming, starts
     // consuming; throws when the broker cannot be reached. Without it the
-    // queue fills until someone starts Subscriber().
+    // queue fills until someone starts Subscriber(). With a durable queue
+    // name the queue is "TagService_" + that name, durable and kept when the
+    // service ends.
     TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager, TagServiceLogic& logic,
-                       bool verbose, bool startConsuming = true);
+                       bool verbose, bool startConsuming = true,
+                       const std::string& durableQueue = std::string());
     // Stops consuming, then closes the service's channels.
     ~TagServiceEndpoint();
     TagServiceEndpoint(const TagServiceEndpoint&) = delete;

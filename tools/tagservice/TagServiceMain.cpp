@@ -97,8 +97,8 @@ int Run(const TagService::ServiceOptions& options) {
         manager = ManagerFor(options, broker);
         statusLines = std::make_unique<TagService::StatusLinePump>(*manager);
         // The host starts the consumers when it goes live.
-        endpoint = std::make_unique<TagService::TagServiceEndpoint>(*manager, logic,
-                                                                    options.verbose, false);
+        endpoint = std::make_unique<TagService::TagServiceEndpoint>(
+            *manager, logic, options.verbose, false, options.durableQueue);
         host = std::make_unique<TagService::TagServiceHost>(
             &shutdownEvent, *endpoint,
             std::string(TagService::kReadyLine) + " (queue " + endpoint->QueueName() +

@@ -44,4 +44,39 @@ bool AmqpChannel::TryTakeReturnEvent(ResetEvent& out) {
     return ReturnEvents->TryTake(out, 0);
 }
 
+void AmqpChannel::MarkUnbound() {
+    std::lock_guard<std::mutex> lock(BoundMutex);
+    Bound = false;
+    ++BoundGeneration;
+}
+
+void AmqpChannel::RequestReset() {
+    MarkUnbound();
+    ChannelReset.Release();
+}
+
+uint64_t AmqpChannel::Generation() const {
+    std::lock_guard<std::mutex> lock(BoundMutex);
+    return BoundGeneration;
+}
+
+void AmqpChannel::MarkBound(uint64_t generation) {
+    {
+        std::lock_guard<std::mutex> lock(BoundMutex);
+        if (generation != BoundGeneration) return;
+        Bound = true;
+    }
+    BoundChanged.notify_all();
+}
+
+bool AmqpChannel::IsBound() const {
+    std::lock_guard<std::mutex> lock(BoundMutex);
+    return Bound;
+}
+
+bool AmqpChannel::WaitBound(std::chrono::steady_clock::duration timeout) const {
+    std::unique_lock<std::mutex> lock(BoundMutex);
+    return BoundChanged.wait_for(lock, timeout, [this] { return Bound; });
+}
+
 }  // namespace Korvane::Veldra::MessageBus

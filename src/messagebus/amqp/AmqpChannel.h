@@ -2,6 +2,8 @@
 
 #include <amqp.h>
 
+#include <chrono>
+#include <condition_variable>
 #include <cstdint>
 #include <memory>
 #include <mutex>
@@ -66,6 +68,27 @@ public:
     // Takes a waiting notice without waiting.
     bool TryTakeReturnEvent(ResetEvent& out);
 
+    // ---- Whether the queue and bindings are in place on the broker ----
+    // A reply sent to a queue that a lost connection took with it (an
+    // auto-delete queue goes with its last consumer) is dropped by the
+    // broker, so a request that expects a reply waits for its queue first.
+    // Every change of connection or channel makes a new generation; only the
+    // rebind that started in the current generation marks it bound again.
+
+    // The queue may be gone: the connection or the channel was lost.
+    void MarkUnbound();
+    // MarkUnbound, then posts ChannelReset so that the consumer declares and
+    // binds anew.
+    void RequestReset();
+    // The generation a rebind starts in.
+    uint64_t Generation() const;
+    // The rebind of that generation succeeded; nothing when a newer loss
+    // came meanwhile, whose own rebind follows.
+    void MarkBound(uint64_t generation);
+    bool IsBound() const;
+    // Waits up to `timeout` for the channel to be bound; true when it is.
+    bool WaitBound(std::chrono::steady_clock::duration timeout) const;
+
     const uint16_t Id;
     const std::shared_ptr<EnvelopeQueue> Envelopes;
     const std::shared_ptr<ReturnEventQueue> ReturnEvents;
@@ -75,6 +98,12 @@ public:
 private:
     mutable std::recursive_mutex BindingMutex;
     std::vector<AmqpBinding> Bindings;
+
+    // Guards the two below; BoundChanged is notified when Bound turns true.
+    mutable std::mutex BoundMutex;
+    mutable std::condition_variable BoundChanged;
+    bool Bound = true;
+    uint64_t BoundGeneration = 0;
 };
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -18,6 +18,7 @@
 #include "messagebus/amqp/AmqpReplyText.h"
 #include "messagebus/amqp/CaCertificate.h"
 #include "messagebus/amqp/TlsSocketRules.h"
+#include "messagebus/concurrency/Backoff.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -153,19 +154,34 @@ AmqpConnection::~AmqpConnection() {
 }
 
 void AmqpConnection::Connect() {
+    Establish(true);
+}
+
+void AmqpConnection::ConnectOnce() {
+    Establish(false);
+}
+
+void AmqpConnection::Establish(bool untilDeadline) {
     Log("Connecting to AMQP with " + TimeoutText(ConnectTimeoutMs) + " timeout...");
-    ControlGateGuard gate(Gate);
+    // Deliberate hardening: the socket is opened and the login made on a
+    // connection state of its own, without the gate. Connect attempts can
+    // last the whole connect time-out; a publish or a control call meanwhile
+    // must fail at once on the lost connection, not wait behind them.
     OwnedState state(amqp_new_connection());
     if (!state) {
         throw AmqpException(ErrorCodes::kOpeningTCPConnection, "No TCP connection.", 0);
     }
     amqp_socket_t* socket = NewSocket(state.get());
-    const auto deadline = steady_clock::now() + milliseconds(ConnectTimeoutMs);
-    const int status = OpenSocket(socket);
+    const auto started = steady_clock::now();
+    const int status = untilDeadline ? OpenSocket(socket) : OpenSocketOnce(socket);
     if (status != AMQP_STATUS_OK) ThrowOpenFailure(status);
 
     BoundSilentPeer(state.get());
-    if (ConnectTimeoutMs >= 0) BoundHandshake(state.get(), deadline);
+    if (!untilDeadline) {
+        BoundHandshake(state.get(), steady_clock::now() + milliseconds(kLongestAttemptMs));
+    } else if (ConnectTimeoutMs >= 0) {
+        BoundHandshake(state.get(), started + milliseconds(ConnectTimeoutMs));
+    }
     CheckReply(amqp_login(state.get(), "/", 0, kFrameMax, HeartbeatSeconds, AMQP_SASL_METHOD_PLAIN,
                           User.c_str(), Password.c_str()),
                ErrorCodes::kFailedToLogIn, "Error logging in to RabbitMQ. ");
@@ -174,17 +190,61 @@ void AmqpConnection::Connect() {
     // channels opened again below) have nobody else to watch them.
     SetRpcTimeout(state.get(), std::chrono::duration_cast<milliseconds>(StallLimit() / 2));
 
-    // Nobody else can be using the replaced state: every call takes the gate.
-    if (Connection != nullptr) amqp_destroy_connection(Connection);
-    Connection = state.release();
-    Socket = socket;
-
-    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    // The recorded channels keep their numbers on the new connection.
     std::vector<uint16_t> ids;
-    for (const auto& entry : Channels) ids.push_back(entry.first);
+    bool declareExchange = false;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+        for (const auto& entry : Channels) ids.push_back(entry.first);
+        declareExchange = ExchangeDeclared;
+    }
     std::sort(ids.begin(), ids.end());
-    for (const uint16_t id : ids) OpenChannel(id);
+    for (const uint16_t id : ids) OpenChannelOn(state.get(), id);
+    // Deliberate hardening: a node that restarted without its definitions has
+    // lost the exchange, and every publish to it would close its channel, so
+    // a connection that had declared it declares it again.
+    if (declareExchange && !ids.empty()) DeclareExchangeOn(state.get(), ids.front());
+
+    OwnedState replaced;
+    {
+        ControlGateGuard gate(Gate);
+        std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+        // Channels made or closed on the old connection while this one was
+        // being built: a number left open would be refused when it is taken
+        // again.
+        for (const auto& entry : Channels) {
+            if (!std::binary_search(ids.begin(), ids.end(), entry.first)) {
+                OpenChannelOn(state.get(), entry.first);
+            }
+        }
+        for (const uint16_t id : ids) {
+            if (Channels.count(id) == 0) amqp_channel_close(state.get(), id, AMQP_REPLY_SUCCESS);
+        }
+        replaced.reset(Connection);
+        Connection = state.release();
+        Socket = socket;
+        ClosedChannels.clear();
+        ConnectionLost = false;
+    }
+    // The old state goes outside the gate: nobody can reach it any more.
+    replaced.reset();
     Log("Successfully connected to AMQP.");
+}
+
+void AmqpConnection::DropConnection() {
+    // Connection changes on this thread alone, so it may be read here
+    // without the gate.
+    if (Connection == nullptr) return;
+    const int fd = amqp_get_sockfd(Connection);
+    if (fd >= 0) shutdown(fd, SHUT_RDWR);
+    // Gone before the new connection declares anything: the broker then ends
+    // the old consumers, and deletes their auto-delete queues, before they
+    // are declared again rather than after.
+    ControlGateGuard gate(Gate);
+    amqp_destroy_connection(Connection);
+    Connection = nullptr;
+    Socket = nullptr;
+    ClosedChannels.clear();
 }
 
 amqp_socket_t* AmqpConnection::NewSocket(amqp_connection_state_t state) {
@@ -218,22 +278,42 @@ int AmqpConnection::OpenSocket(amqp_socket_t* socket) {
     }
     const int32_t attemptMs = std::min(ConnectTimeoutMs, kLongestAttemptMs);
     const auto deadline = steady_clock::now() + milliseconds(ConnectTimeoutMs);
+    // Deliberate hardening: a failure other than a refusal can come at once
+    // too (a host name that does not resolve), and is then tried again after
+    // a growing pause instead of in a busy loop.
+    Backoff backoff;
     for (;;) {
+        const auto attemptStarted = steady_clock::now();
         timeval attempt{attemptMs / 1000, (attemptMs % 1000) * 1000};
         const int status = amqp_socket_open_noblock(socket, Host.c_str(), Port, &attempt);
-        const auto remaining =
-            std::chrono::duration_cast<milliseconds>(deadline - steady_clock::now());
+        const auto now = steady_clock::now();
+        const auto remaining = std::chrono::duration_cast<milliseconds>(deadline - now);
         if (remaining.count() <= 0 || !IsRetriedOpenStatus(status) || StopRequested) {
             return status;
         }
-        if (status == AMQP_STATUS_SOCKET_ERROR) {
-            // A refused connection fails at once: wait before the next try,
-            // but not past the deadline.
-            PauseBetweenAttempts(
-                std::min<steady_clock::duration>(kPauseAfterSocketError, remaining));
+        // A refused connection fails at once: wait before the next try. The
+        // others have taken their attempt's time, unless they came sooner
+        // than the back-off.
+        const steady_clock::duration pause =
+            status == AMQP_STATUS_SOCKET_ERROR
+                ? steady_clock::duration(kPauseAfterSocketError)
+                : std::max<steady_clock::duration>(
+                      steady_clock::duration::zero(),
+                      milliseconds(backoff.NextMs()) - (now - attemptStarted));
+        if (pause > steady_clock::duration::zero()) {
+            PauseBetweenAttempts(std::min<steady_clock::duration>(pause, remaining));
             if (StopRequested) return status;
         }
     }
+}
+
+int AmqpConnection::OpenSocketOnce(amqp_socket_t* socket) {
+    // A connect time-out of 0 allows the first connect one instant attempt;
+    // a reconnect, which has no caller waiting, gets a whole one.
+    const int32_t attemptMs = ConnectTimeoutMs <= 0 ? kLongestAttemptMs
+                                                    : std::min(ConnectTimeoutMs, kLongestAttemptMs);
+    timeval attempt{attemptMs / 1000, (attemptMs % 1000) * 1000};
+    return amqp_socket_open_noblock(socket, Host.c_str(), Port, &attempt);
 }
 
 void AmqpConnection::PauseBetweenAttempts(steady_clock::duration pause) {
@@ -298,11 +378,21 @@ std::shared_ptr<AmqpChannel> AmqpConnection::CreateChannel() {
 void AmqpConnection::CloseChannel(uint16_t channelId) {
     ControlGateGuard gate(Gate);
     std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
-    if (Channels.erase(channelId) == 0 || Connection == nullptr) return;
+    const auto found = Channels.find(channelId);
+    if (found == Channels.end()) return;
+    // From here on no notice of a returned message reaches it.
+    Channels.erase(found);
+    if (ClosedChannels.erase(channelId) != 0) return;  // closed and answered already
+    if (Connection == nullptr || ConnectionLost) return;  // the next connection will not open it
     // The number goes back to CreateChannel, and opening a channel that is
-    // still open would make the broker close the whole connection.
+    // still open would make the broker close the whole connection. A close
+    // is often made on the way out, where nobody keeps the watchdog: the
+    // broker gets a few seconds to answer.
+    SetRpcTimeout(Connection, std::min(kLongestCloseWait, std::chrono::duration_cast<milliseconds>(
+                                                              StallLimit() / 2)));
     SocketWatchdog::Scope watch(Watchdog, Connection);
     const amqp_rpc_reply_t reply = amqp_channel_close(Connection, channelId, AMQP_REPLY_SUCCESS);
+    SetRpcTimeout(Connection, std::chrono::duration_cast<milliseconds>(StallLimit() / 2));
     if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
         Log("Error closing AMQP channel " + std::to_string(channelId) + ". " +
             AmqpReplyText(reply));
@@ -325,20 +415,32 @@ void AmqpConnection::OpenChannel(uint16_t channelId) {
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kOpeningChannel, context);
     SocketWatchdog::Scope watch(Watchdog, Connection);
-    amqp_channel_open(Connection, channelId);
-    CheckReply(LastReply(), ErrorCodes::kOpeningChannel, context);
+    OpenChannelOn(Connection, channelId);
+}
+
+void AmqpConnection::OpenChannelOn(amqp_connection_state_t state, uint16_t channelId) {
+    amqp_channel_open(state, channelId);
+    CheckReply(amqp_get_rpc_reply(state), ErrorCodes::kOpeningChannel,
+               "Error opening AMQP channel. ");
+}
+
+std::string AmqpConnection::DeclareExchangeContext(uint16_t channelId) const {
+    return "Error declaring topic exchange. Channel ID: " + std::to_string(channelId) +
+           ". Exchange name: \"" + ExchangeName + "\". ";
 }
 
 void AmqpConnection::DeclareExchange(uint16_t channelId) {
-    const std::string context =
-        "Error declaring topic exchange. Channel ID: " + std::to_string(channelId) +
-        ". Exchange name: \"" + ExchangeName + "\". ";
     ControlGateGuard gate(Gate);
-    RequireConnection(ErrorCodes::kDeclaringExchange, context);
+    RequireConnection(ErrorCodes::kDeclaringExchange, DeclareExchangeContext(channelId));
     SocketWatchdog::Scope watch(Watchdog, Connection);
-    amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
+    DeclareExchangeOn(Connection, channelId);
+}
+
+void AmqpConnection::DeclareExchangeOn(amqp_connection_state_t state, uint16_t channelId) {
+    amqp_exchange_declare(state, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
                           amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
-    CheckReply(LastReply(), ErrorCodes::kDeclaringExchange, context);
+    CheckReply(amqp_get_rpc_reply(state), ErrorCodes::kDeclaringExchange,
+               DeclareExchangeContext(channelId));
 }
 
 void AmqpConnection::SetQos(uint16_t channelId, uint32_t prefetchSize, uint16_t prefetchCount,

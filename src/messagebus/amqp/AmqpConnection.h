@@ -11,6 +11,7 @@
 #include <string>
 #include <thread>
 #include <unordered_map>
+#include <unordered_set>
 
 #include "errors/AmqpException.h"
 #include "messagebus/amqp/AmqpChannel.h"
@@ -52,7 +53,9 @@ public:
     virtual void ReaderLoop() = 0;
 
     // Opens the socket, logs in, and opens every recorded channel again with
-    // its number. Also the reconnect step.
+    // its number, trying until the connect time-out has passed. The new
+    // connection is made without the gate, which is taken only to put it in
+    // place.
     void Connect();
     void OpenChannel(uint16_t channelId);
     // The topic exchange ExchangeName: durable, not auto-deleted, not internal.
@@ -70,6 +73,9 @@ public:
     // The recorded channel of a number, or null.
     std::shared_ptr<AmqpChannel> FindChannel(uint16_t channelId) const;
     bool IsConnected() const;
+    // True from the moment a reader found the connection lost until a new
+    // one is in place. Read without the gate.
+    bool IsLost() const { return ConnectionLost.load(); }
 
 protected:
     // As the public constructor, with the TLS start-up library given: tests
@@ -87,6 +93,13 @@ protected:
     // Sets StopRequested and cuts short the wait between connect attempts, so
     // a Connect in progress ends at its current attempt.
     void RequestStop();
+    // As Connect, with one attempt to open the socket: the reconnect thread
+    // makes the pauses between attempts itself.
+    void ConnectOnce();
+    // Shuts the socket of a lost connection down, so that a call still blocked
+    // on it returns, and destroys the connection. Only the thread that
+    // replaces connections calls it.
+    void DropConnection();
 
     // A status line to the manager's log (nothing without a manager).
     void Log(const std::string& line) const;
@@ -99,6 +112,9 @@ protected:
     // RPC) gives up after half of it, so that it ends, and rabbitmq-c closes
     // the socket, before the watchdog would cut it.
     std::chrono::steady_clock::duration StallLimit() const;
+
+    // The start of the text of a failed exchange declaration.
+    std::string DeclareExchangeContext(uint16_t channelId) const;
 
     // Throws AmqpException(code, context + ReplyText(reply), library_error)
     // unless the reply is normal.
@@ -139,15 +155,30 @@ protected:
     // Every call on the socket runs inside one of its scopes; the reconnect
     // thread of a polling connection keeps it.
     SocketWatchdog Watchdog;
+    // Set by a reader that found the connection lost, cleared when a new one
+    // is in place: calls that would only meet the dead socket fail at once.
+    std::atomic<bool> ConnectionLost{false};
+    // Channels that the broker closed on the current connection and that were
+    // answered with close-ok; a new connection opens every channel again.
+    // Guarded by the gate.
+    std::unordered_set<uint16_t> ClosedChannels;
 
 private:
+    // Connect and ConnectOnce: builds, opens and logs in a connection of its
+    // own, opens the recorded channels on it, then puts it in place.
+    void Establish(bool untilDeadline);
     // Opens the socket within the time-out rules; returns the last status.
     int OpenSocket(amqp_socket_t* socket);
+    // One attempt of at most the longest attempt time.
+    int OpenSocketOnce(amqp_socket_t* socket);
     // Sleeps for up to the given time, less when a stop is requested.
     void PauseBetweenAttempts(std::chrono::steady_clock::duration pause);
     // Builds the TLS or TCP socket on the new connection state.
     amqp_socket_t* NewSocket(amqp_connection_state_t state);
     [[noreturn]] void ThrowOpenFailure(int status) const;
+    // OpenChannel and DeclareExchange on a given connection state.
+    static void OpenChannelOn(amqp_connection_state_t state, uint16_t channelId);
+    void DeclareExchangeOn(amqp_connection_state_t state, uint16_t channelId);
 
     SslInitLease SslLease;
     std::mutex PauseMutex;

@@ -192,19 +192,39 @@ void AmqpConnectionManager::Stop() {
     GetConsumerConnection()->Stop();
 }
 
+template <typename Connection>
+std::shared_ptr<Connection> AmqpConnectionManager::Existing(
+    const std::shared_ptr<Connection>& field) const {
+    std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
+    return field;
+}
+
 void AmqpConnectionManager::DeliverReturnEvent(const ResetEvent& event) {
     // Called from the publisher's reader: never makes a connection, and with
     // no consumer connection nobody waits for the notice.
-    std::shared_ptr<AmqpConsumerConnection> consumer;
-    {
-        std::lock_guard<std::recursive_mutex> lock(ManagerMutex);
-        consumer = Consumer;
-    }
-    if (consumer) consumer->DeliverReturnEvent(event);
+    if (const auto consumer = Existing(Consumer)) consumer->DeliverReturnEvent(event);
+}
+
+void AmqpConnectionManager::ResetConsumerChannels() {
+    if (const auto consumer = Existing(Consumer)) consumer->ResetChannels();
+}
+
+void AmqpConnectionManager::CloseConsumerChannel(const std::shared_ptr<AmqpChannel>& channel) {
+    const uint16_t id = IdOf(channel);
+    if (const auto consumer = Existing(Consumer)) consumer->CloseChannel(id);
+}
+
+void AmqpConnectionManager::ConsumerConnectionLost() {
+    if (const auto publisher = Existing(Publisher)) publisher->PollSoon();
+}
+
+bool AmqpConnectionManager::IsPublisherLost() {
+    const auto publisher = Existing(Publisher);
+    return !publisher || publisher->IsLost();
 }
 
 void AmqpConnectionManager::Log(const std::string& line) {
-    StatusLines.Add(line);
+    StatusLines.AddEvictingOldest(line);
 }
 
 bool AmqpConnectionManager::TakeLog(std::string& line, uint32_t timeoutMs) {

@@ -28,6 +28,8 @@ class AmqpConnectionManager {
 public:
     static constexpr int32_t kHeartbeatSeconds = 270;
     static constexpr int32_t kDefaultConnectTimeoutMs = 180000;
+    // Status lines kept for TakeLog: the newest ones.
+    static constexpr int32_t kStatusLineLimit = 1000;
 
     // Settings from the selected configuration of the process.
     AmqpConnectionManager();
@@ -77,9 +79,22 @@ public:
     void Stop();
     // Gives the notice to every channel of the consumer connection.
     void DeliverReturnEvent(const ResetEvent& event);
+    // Posts the reset of every channel of the consumer connection, if there
+    // is one, so that each consumer declares its queue and binds again.
+    void ResetConsumerChannels();
+    // Closes the channel on the consumer connection, if there is one.
+    void CloseConsumerChannel(const std::shared_ptr<AmqpChannel>& channel);
+    // True while the publisher connection is lost, or was never made.
+    bool IsPublisherLost();
+    // The consumer connection was found lost: the publisher's reader looks at
+    // its own connection at once instead of within the second.
+    void ConsumerConnectionLost();
 
     // ---- Status lines and the last asynchronous error ----
+    // Appends a status line; past kStatusLineLimit the oldest one goes.
     void Log(const std::string& line);
+    // The status lines kept at the moment.
+    std::size_t StatusLineCount() const { return StatusLines.Size(); }
     bool TakeLog(std::string& line, uint32_t timeoutMs);
     // Keeps a copy of text and code; an AmqpException's status is not kept.
     void SetLastError(const VeldraException& error);
@@ -105,6 +120,9 @@ private:
 
     template <typename Connection>
     std::shared_ptr<Connection> GetOrMake(std::shared_ptr<Connection>& field);
+    // The connection if it has been made; never makes one.
+    template <typename Connection>
+    std::shared_ptr<Connection> Existing(const std::shared_ptr<Connection>& field) const;
 
     std::string Host;
     std::string ExchangeName;
@@ -117,7 +135,9 @@ private:
     int32_t HeartbeatSeconds = kHeartbeatSeconds;
     int32_t ConnectTimeoutMs = kDefaultConnectTimeoutMs;
     // Declared before the connections: their threads log until they end.
-    SharedQueue<std::string> StatusLines;
+    // Deliberate hardening: bounded, as a reconnect loop that retries for
+    // days logs each attempt, and nothing in the library drains them.
+    SharedQueue<std::string> StatusLines{kStatusLineLimit};
     std::unique_ptr<VeldraException> LastError;
     std::shared_ptr<AmqpPublisherConnection> Publisher;
     std::shared_ptr<AmqpConsumerConnection> Consumer;

@@ -6,6 +6,7 @@
 #include "messagebus/amqp/AmqpConnectionManager.h"
 #include "errors/ErrorCodes.h"
 #include "messagebus/amqp/EnvelopeHeaders.h"
+#include "messagebus/concurrency/Backoff.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
@@ -59,6 +60,14 @@ AmqpConsumer::~AmqpConsumer() {
     StopSignal.Release();
     HandlingThread->join();
     RebindThread->join();
+    // Deliberate hardening: the channel goes with its consumer. Left open, it
+    // would keep a broker channel for nothing and collect a copy of every
+    // returned-message notice of the connection for the life of the process.
+    try {
+        Manager->CloseConsumerChannel(Channel);
+    } catch (...) {
+        // The connection is failing; its replacement will not open the channel.
+    }
 }
 
 void AmqpConsumer::DeclareQueue() {
@@ -107,9 +116,20 @@ std::shared_ptr<Interfaces::ITraceLogger> AmqpConsumer::Logger(TracePoint* rawMe
 
 void AmqpConsumer::RebindLoop() {
     try {
+        Backoff backoff(Backoff::kFirstMs, kLongestRebindPauseMs);
+        bool failed = false;
         while (!StopRebinding) {
-            Channel->ChannelReset.Wait();
+            if (failed) {
+                // Deliberate hardening: a rebind that failed is tried again
+                // after a pause (a new reset or the stop ends it early), not
+                // left until the next reset: until it succeeds the queue may
+                // not exist, and nothing sent to it arrives.
+                Channel->ChannelReset.Acquire(backoff.NextMs());
+            } else {
+                Channel->ChannelReset.Wait();
+            }
             if (StopRebinding) return;
+            const uint64_t generation = Channel->Generation();
             // Queue first, then every binding with its consume: this is what
             // restores the consumer on a new connection or channel.
             try {
@@ -117,14 +137,22 @@ void AmqpConsumer::RebindLoop() {
                 // A reopened channel or a new connection has lost the prefetch.
                 Manager->SetQos(Channel, 0, PrefetchCount, false);
                 Manager->RebindAll(Channel, !ManualAck);
+                Channel->MarkBound(generation);
+                backoff.Reset();
+                failed = false;
             } catch (const std::exception& error) {
                 Manager->SetLastError(AsVeldraException(error));
+                failed = true;
             }
         }
     } catch (const std::exception& error) {
         // The wait itself failed.
         Manager->SetLastError(AsVeldraException(error));
     }
+}
+
+bool AmqpConsumer::WaitBound(std::chrono::steady_clock::duration timeout) const {
+    return Channel->WaitBound(timeout);
 }
 
 void AmqpConsumer::HandlingLoop() {
@@ -157,9 +185,10 @@ void AmqpConsumer::HandlingLoop() {
 void AmqpConsumer::HandleOnce() {
     EnvelopePtr envelope;
     if (Channel->Envelopes->TryTake(envelope, kWaitMs)) Dispatch(envelope);
+    // Every notice that came meanwhile: more than one may come in each wait.
     ResetEvent returned;
-    if (Channel->TryTakeReturnEvent(returned) && ReceiveCallback) {
-        ReceiveCallback->PublishFailed(returned);
+    while (Channel->TryTakeReturnEvent(returned)) {
+        if (ReceiveCallback) ReceiveCallback->PublishFailed(returned);
     }
 }
 
@@ -176,7 +205,7 @@ bool AmqpConsumer::Recover(const std::string& line) {
     }
     try {
         // Declare and bind anew: the failure may have left the channel unusable.
-        Channel->ChannelReset.Release();
+        Channel->RequestReset();
         return StopSignal.Acquire(kWaitMs);
     } catch (...) {
         return StopHandling.load();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <atomic>
+#include <chrono>
 #include <cstdint>
 #include <memory>
 #include <mutex>
@@ -45,6 +46,13 @@ public:
     void Requeue(uint64_t deliveryTag);
     // Keeps the logger and reads its "RawMessages" point; null is allowed.
     void SetTraceLogger(std::shared_ptr<Interfaces::ITraceLogger> traceLogger);
+
+    // Waits up to `timeout` until the queue and its bindings are in place:
+    // after a reconnect or a channel reset, until the rebind succeeded.
+    bool WaitBound(std::chrono::steady_clock::duration timeout) const;
+
+    // The longest pause between two failed rebinds.
+    static constexpr uint32_t kLongestRebindPauseMs = 2000;
 
     const std::string& GetConsumerTag() const { return ConsumerTag; }
     const std::string& GetQueueName() const { return QueueName; }

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "errors/ErrorCodes.h"
+#include "messagebus/amqp/AmqpConnectionManager.h"
 #include "messagebus/amqp/AmqpFrames.h"
 
 namespace Korvane::Veldra::MessageBus {
@@ -76,12 +77,6 @@ std::shared_ptr<AmqpChannel> AmqpConsumerConnection::CreateChannel() {
 void AmqpConsumerConnection::CloseChannel(uint16_t channelId) {
     ControlGateGuard gate(Gate);
     std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
-    if (IsClosed(channelId)) {
-        // Closed and answered already; a second close would be a protocol error.
-        ClosedChannels.erase(channelId);
-        Channels.erase(channelId);
-        return;
-    }
     AmqpPollingConnection::CloseChannel(channelId);
 }
 
@@ -194,57 +189,21 @@ void AmqpConsumerConnection::DeliverReturnedMessage(const ResetEvent& event) {
     DeliverReturnEvent(event);
 }
 
-void AmqpConsumerConnection::OnChannelClosed(amqp_channel_t channel) {
-    AnswerChannelClose(channel);
-    AmqpPollingConnection::OnChannelClosed(channel);
-}
-
-void AmqpConsumerConnection::AnswerChannelClose(uint16_t channelId) {
-    // Until the close-ok the broker drops every frame on the channel, and a
-    // declaration sent there would wait for its answer until the watchdog
-    // cut the whole connection.
-    amqp_channel_close_ok_t closeOk{};
-    const int status =
-        amqp_send_method(Connection, channelId, AMQP_CHANNEL_CLOSE_OK_METHOD, &closeOk);
-    if (status != AMQP_STATUS_OK) {
-        // The socket is failing: the reader's next poll starts a reconnect.
-        Log(LibraryExceptionLine(status));
-        return;
-    }
-    ClosedChannels[channelId] = Connection;
-}
-
-void AmqpConsumerConnection::ReopenIfClosed(uint16_t channelId) {
-    const auto found = ClosedChannels.find(channelId);
-    if (found == ClosedChannels.end()) return;
-    if (found->second == Connection) {
-        SocketWatchdog::Scope watch(Watchdog, Connection);
-        OpenChannel(channelId);
-    }
-    ClosedChannels.erase(channelId);
-}
-
-bool AmqpConsumerConnection::IsClosed(uint16_t channelId) const {
-    const auto found = ClosedChannels.find(channelId);
-    return found != ClosedChannels.end() && found->second == Connection;
-}
-
-void AmqpConsumerConnection::CheckChannelReply(uint16_t channelId, int32_t code,
-                                               const std::string& context) {
-    const amqp_rpc_reply_t reply = LastReply();
-    if (reply.reply_type == AMQP_RESPONSE_NORMAL) return;
-    // The text first: the answer may reuse what the reply points into.
-    const AmqpException error(code, context + ReplyText(reply), reply.library_error);
-    if (reply.reply_type == AMQP_RESPONSE_SERVER_EXCEPTION &&
-        reply.reply.id == AMQP_CHANNEL_CLOSE_METHOD) {
-        AnswerChannelClose(channelId);
-    }
-    throw error;
+void AmqpConsumerConnection::ResetChannels() {
+    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+    for (const auto& entry : Channels) entry.second->RequestReset();
 }
 
 void AmqpConsumerConnection::OnReconnected() {
-    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
-    for (const auto& entry : Channels) entry.second->ChannelReset.Release();
+    ResetChannels();
+}
+
+void AmqpConsumerConnection::OnConnectionLost() {
+    {
+        std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+        for (const auto& entry : Channels) entry.second->MarkUnbound();
+    }
+    if (Manager != nullptr) Manager->ConsumerConnectionLost();
 }
 
 void AmqpConsumerConnection::ReaderLoop() {

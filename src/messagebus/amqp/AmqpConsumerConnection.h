@@ -56,6 +56,8 @@ public:
     void Requeue(uint16_t channelId, uint64_t deliveryTag);
     // A copy of the notice to the return queue of every channel.
     void DeliverReturnEvent(const ResetEvent& event);
+    // Posts the reset of every channel: each consumer declares and binds anew.
+    void ResetChannels();
 
     // Polls until the connection is lost or stopped. A poll that throws ends
     // the loop like a lost connection: the error goes to the manager's last
@@ -75,30 +77,16 @@ protected:
     // Posts the reset of every channel, so that the consumers declare and
     // bind again on the new connection.
     void OnReconnected() override;
+    // Every channel's queue may be gone with the connection.
+    void OnConnectionLost() override;
     void DeliverReturnedMessage(const ResetEvent& event) override;
-    // Answers with close-ok and marks the channel closed before its reset is
-    // posted, so that the consumer's next declaration opens it again.
-    void OnChannelClosed(amqp_channel_t channel) override;
 
     // One poll of the reader loop; virtual so that a test can make it fail.
     virtual void ReaderStep();
 
 private:
-    // Sends channel.close-ok and marks the channel closed. Gate held.
-    void AnswerChannelClose(uint16_t channelId);
-    // Opens a channel the broker closed on this connection again. Gate held.
-    void ReopenIfClosed(uint16_t channelId);
-    bool IsClosed(uint16_t channelId) const;
-    // CheckReply for a call on the channel; a channel.close in the reply is
-    // answered first.
-    void CheckChannelReply(uint16_t channelId, int32_t code, const std::string& context);
-
     // ---- State ----
     int32_t StartCount = 0;
-    // Channels the broker closed, each with the connection it closed them on:
-    // a mark from an earlier connection is void, as Connect opened every
-    // channel again. Guarded by the gate.
-    std::unordered_map<uint16_t, amqp_connection_state_t> ClosedChannels;
 };
 
 }  // namespace Korvane::Veldra::MessageBus

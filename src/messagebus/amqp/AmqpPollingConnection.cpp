@@ -5,14 +5,13 @@
 
 #include "errors/ErrorCodes.h"
 #include "messagebus/amqp/AmqpFrames.h"
+#include "messagebus/concurrency/Backoff.h"
 
 namespace Korvane::Veldra::MessageBus {
 namespace {
 
 // The reconnect thread looks at the watchdog this often.
 constexpr uint32_t kWatchPeriodMs = 1000;
-// The pause between two failed attempts to connect again.
-constexpr uint32_t kReconnectRetryMs = 500;
 
 void Drain(Semaphore& semaphore) {
     while (semaphore.Acquire(0)) {
@@ -118,10 +117,50 @@ void AmqpPollingConnection::HandleMethod(amqp_method_number_t method, amqp_chann
 }
 
 void AmqpPollingConnection::OnChannelClosed(amqp_channel_t channel) {
+    AnswerChannelClose(channel);
     if (const auto closed = FindChannel(channel)) {
         Log("AMQP channel was unexpectedly closed.");
-        closed->ChannelReset.Release();
+        closed->RequestReset();
     }
+}
+
+void AmqpPollingConnection::AnswerChannelClose(uint16_t channelId) {
+    // Until the close-ok the broker drops every frame on the channel, and a
+    // call sent there would wait for its answer until the watchdog cut the
+    // whole connection.
+    amqp_channel_close_ok_t closeOk{};
+    const int status =
+        amqp_send_method(Connection, channelId, AMQP_CHANNEL_CLOSE_OK_METHOD, &closeOk);
+    if (status != AMQP_STATUS_OK) {
+        // The socket is failing: the reader's next poll starts a reconnect.
+        Log(LibraryExceptionLine(status));
+        return;
+    }
+    ClosedChannels.insert(channelId);
+}
+
+bool AmqpPollingConnection::ReopenIfClosed(uint16_t channelId) {
+    if (ClosedChannels.count(channelId) == 0) return false;
+    OpenChannel(channelId);
+    ClosedChannels.erase(channelId);
+    return true;
+}
+
+bool AmqpPollingConnection::IsClosed(uint16_t channelId) const {
+    return ClosedChannels.count(channelId) != 0;
+}
+
+void AmqpPollingConnection::CheckChannelReply(uint16_t channelId, int32_t code,
+                                              const std::string& context) {
+    const amqp_rpc_reply_t reply = LastReply();
+    if (reply.reply_type == AMQP_RESPONSE_NORMAL) return;
+    // The text first: the answer may reuse what the reply points into.
+    const AmqpException error(code, context + ReplyText(reply), reply.library_error);
+    if (reply.reply_type == AMQP_RESPONSE_SERVER_EXCEPTION &&
+        reply.reply.id == AMQP_CHANNEL_CLOSE_METHOD) {
+        AnswerChannelClose(channelId);
+    }
+    throw error;
 }
 
 void AmqpPollingConnection::LibraryFailure(int status) {
@@ -130,6 +169,8 @@ void AmqpPollingConnection::LibraryFailure(int status) {
 }
 
 void AmqpPollingConnection::Disconnect() {
+    ConnectionLost = true;
+    OnConnectionLost();
     Disconnected = true;
     ReconnectSignal.Release();
 }
@@ -173,15 +214,22 @@ void AmqpPollingConnection::ReconnectLoop() {
                 continue;
             }
             if (StopRequested) return;
+            // Deliberate hardening: a failed attempt is tried again, for as
+            // long as the connection is meant to run, so that a broker that is
+            // down when the first attempt comes (a node restart, an
+            // application stop) does not leave the connection broken for
+            // good. Each attempt opens the socket once; the pauses between
+            // them grow, so that a broker that refuses at once costs no CPU,
+            // and stay short enough to find a broker soon after it is back.
+            // A stop ends a pause early.
+            Backoff backoff(Backoff::kFirstMs, kLongestReconnectPauseMs);
+            const Clock::time_point lostAt = Clock::now();
             Log(texts_.reconnecting);
-            // A failed attempt is tried again after a pause, for as long as
-            // the connection is meant to run: a broker that is down when the
-            // first attempt comes (a node restart, an application stop) must
-            // not leave the connection broken for good. The pause ends early
-            // on a stop or a new request to reconnect.
-            while (!Reconnect() && !StopRequested) {
-                ReconnectSignal.Acquire(kReconnectRetryMs);
+            while (!Reconnect(lostAt)) {
                 if (StopRequested) return;
+                ReconnectSignal.Acquire(backoff.NextMs());
+                if (StopRequested) return;
+                Watchdog.CutIfStalled(StallLimit());
                 Log(texts_.reconnecting);
             }
         }
@@ -191,20 +239,26 @@ void AmqpPollingConnection::ReconnectLoop() {
     }
 }
 
-bool AmqpPollingConnection::Reconnect() {
+bool AmqpPollingConnection::Reconnect(Clock::time_point lostAt) {
+    const auto report = [&](const VeldraException& error) {
+        const bool overdue = ConnectTimeoutMs >= 0 &&
+                             Clock::now() - lostAt >= std::chrono::milliseconds(ConnectTimeoutMs);
+        if (!StopRequested && overdue) ReportError(error);
+    };
     try {
         Disconnected = true;
         WakeSignal.Release();
         Reader.Join(ReaderThread, Watchdog);
         Disconnected = false;
-        Connect();
+        DropConnection();
+        ConnectOnce();
         OnReconnected();
         StartReader();
         return true;
     } catch (const VeldraException& error) {
-        if (!StopRequested) ReportError(error);
+        report(error);
     } catch (const std::exception& error) {
-        if (!StopRequested) ReportError(VeldraException(ErrorCodes::kException, error.what()));
+        report(VeldraException(ErrorCodes::kException, error.what()));
     }
     return false;
 }

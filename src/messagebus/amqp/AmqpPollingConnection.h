@@ -29,9 +29,12 @@ public:
     };
 
     // Waits for the reader's signal, connects anew and restarts the reader.
-    // A failed Connect goes to the manager's last error, and the connection
-    // stays down: nothing asks again.
+    // A failed attempt goes to the manager's last error and is tried again
+    // after a pause that doubles from 100 ms up to kLongestReconnectPauseMs,
+    // until it succeeds or the connection is stopped.
     void ReconnectLoop() override;
+
+    static constexpr uint32_t kLongestReconnectPauseMs = 2000;
 
 protected:
     AmqpPollingConnection(AmqpConnectionManager* manager, std::string user, std::string password,
@@ -60,20 +63,36 @@ protected:
     void StopThreads();
     // Marks the connection lost and asks for a reconnect.
     void Disconnect();
+    // Called by Disconnect, on the reader's thread, often with the gate held.
+    virtual void OnConnectionLost() {}
     // Called by the reconnect thread after a successful Connect, before the
     // new reader starts.
     virtual void OnReconnected() {}
     // Where the notice of a returned message goes.
     virtual void DeliverReturnedMessage(const ResetEvent& event) = 0;
     // The broker closed the channel; called by the reader with the gate held.
-    // Logs and posts the channel's reset.
+    // Answers with close-ok and marks the channel closed, logs, and posts
+    // the channel's reset.
     virtual void OnChannelClosed(amqp_channel_t channel);
+
+    // ---- Channels the broker closed. Call with the gate held. ----
+    // Sends channel.close-ok and marks the channel closed.
+    void AnswerChannelClose(uint16_t channelId);
+    // Opens a channel the broker closed on this connection again; true when
+    // it had been closed.
+    bool ReopenIfClosed(uint16_t channelId);
+    bool IsClosed(uint16_t channelId) const;
+    // CheckReply for the last call on the channel; a channel.close in the
+    // reply is answered first.
+    void CheckChannelReply(uint16_t channelId, int32_t code, const std::string& context);
 
 private:
     PollOutcome PollUnderGate(const timeval& timeout);
     void StartReader();
-    // One attempt to connect again; false when it failed and was reported.
-    bool Reconnect();
+    // One attempt to connect again; false when it failed. A failure is
+    // reported once the connection has been lost (since lostAt) for longer
+    // than the connect time-out, as a first connect would have given up then.
+    bool Reconnect(Clock::time_point lostAt);
     void Deliver(const EnvelopePtr& envelope);
     void HandleMethod(amqp_method_number_t method, amqp_channel_t channel);
     void LibraryFailure(int status);

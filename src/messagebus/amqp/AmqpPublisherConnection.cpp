@@ -31,6 +31,11 @@ AmqpPublisherConnection::Clock::rep Now() {
     return AmqpPublisherConnection::Clock::now().time_since_epoch().count();
 }
 
+[[noreturn]] void ThrowPublishFailure(int status) {
+    throw AmqpException(ErrorCodes::kPublishingMessage,
+                        "Error publishing message. AMQP status: " + std::to_string(status), status);
+}
+
 }  // namespace
 
 AmqpPublisherConnection::AmqpPublisherConnection(AmqpConnectionManager* manager, std::string user,
@@ -80,15 +85,26 @@ void AmqpPublisherConnection::Stop() {
 
 void AmqpPublisherConnection::Publish(uint16_t channelId, const MessageHeaders& envelope,
                                       const MessageBody& body, bool mandatory) {
+    // Deliberate hardening: while the connection is lost the publish could
+    // only fail, and would first wait for the gate behind calls that meet
+    // the dead socket; a caller that must never block gets its error now.
+    if (ConnectionLost) ThrowPublishFailure(AMQP_STATUS_CONNECTION_CLOSED);
     const AmqpProperties properties = ToAmqpProperties(envelope);
     const AmqpBasicProperties basicProperties(properties);
     amqp_bytes_t bodyBytes;
     bodyBytes.len = body.Length();
     bodyBytes.bytes = const_cast<char*>(body.Data());
     int status = AMQP_STATUS_CONNECTION_CLOSED;
+    bool restored = false;
     {
         ControlGateGuard gate(Gate);
-        if (Connection != nullptr) {
+        if (Connection != nullptr && !ConnectionLost) {
+            try {
+                restored = RestoreClosedChannel(channelId);
+            } catch (const AmqpException& error) {
+                ThrowPublishFailure(error.Status() != 0 ? error.Status()
+                                                        : AMQP_STATUS_CONNECTION_CLOSED);
+            }
             SocketWatchdog::Scope watch(Watchdog, Connection);
             status =
                 amqp_basic_publish(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
@@ -96,12 +112,31 @@ void AmqpPublisherConnection::Publish(uint16_t channelId, const MessageHeaders& 
                                    basicProperties.Get(), bodyBytes);
         }
     }
-    if (status != AMQP_STATUS_OK) {
-        throw AmqpException(ErrorCodes::kPublishingMessage,
-                            "Error publishing message. AMQP status: " + std::to_string(status),
-                            status);
-    }
+    // The bindings of every queue went with a deleted exchange: the consumers
+    // of this manager declare and bind again. Outside the gate, as the
+    // manager reaches the other connection.
+    if (restored && Manager != nullptr) Manager->ResetConsumerChannels();
+    if (status != AMQP_STATUS_OK) ThrowPublishFailure(status);
     LastSend = Now();
+}
+
+bool AmqpPublisherConnection::RestoreClosedChannel(uint16_t channelId) {
+    if (!ReopenIfClosed(channelId)) return false;
+    Log("Reopened AMQP channel " + std::to_string(channelId) +
+        " that the broker had closed; declaring the exchange again.");
+    {
+        SocketWatchdog::Scope watch(Watchdog, Connection);
+        amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
+                              amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
+    }
+    CheckChannelReply(channelId, ErrorCodes::kDeclaringExchange,
+                      DeclareExchangeContext(channelId));
+    return true;
+}
+
+void AmqpPublisherConnection::OnChannelClosed(amqp_channel_t channel) {
+    AnswerChannelClose(channel);
+    if (FindChannel(channel)) Log("AMQP channel was unexpectedly closed.");
 }
 
 void AmqpPublisherConnection::ReaderLoop() {
@@ -119,8 +154,15 @@ void AmqpPublisherConnection::ReaderLoop() {
     }
 }
 
+void AmqpPublisherConnection::PollSoon() {
+    PollRequested = true;
+    WakeSignal.Release();
+}
+
 void AmqpPublisherConnection::ReaderStep() {
-    if (PollPending || Clock::now() - LastPoll > kIdlePollPeriod) Poll();
+    if (PollRequested.exchange(false) || PollPending || Clock::now() - LastPoll > kIdlePollPeriod) {
+        Poll();
+    }
     if (HeartbeatSeconds > 0) {
         const auto quiet = Clock::duration(Now() - LastSend.load());
         if (std::chrono::duration_cast<std::chrono::seconds>(quiet).count() > HeartbeatSeconds) {

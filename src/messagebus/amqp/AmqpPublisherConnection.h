@@ -36,11 +36,19 @@ public:
 
     // Publishes the body on the channel to ExchangeName with the envelope's
     // routing key and properties. Throws AmqpException
-    // (Veldra.AMQPErrorPublishingMessage) on a non-zero status; no retry.
+    // (Veldra.AMQPErrorPublishingMessage) on a non-zero status, and at once,
+    // without waiting for the gate, while the connection is lost; no retry.
+    // A channel that the broker closed is opened again, and the exchange
+    // declared again, before the message goes.
     void Publish(uint16_t channelId, const MessageHeaders& envelope, const MessageBody& body,
                  bool mandatory);
 
     void ReaderLoop() override;
+
+    // Asks the reader to poll at once rather than at its next idle poll: the
+    // other connection to the same broker was just found lost, and this one
+    // most likely is too.
+    void PollSoon();
 
 protected:
     // As the public constructor, with the TLS start-up library given.
@@ -53,8 +61,14 @@ protected:
     // Hands the notice to the manager, which gives it to every channel of the
     // consumer connection.
     void DeliverReturnedMessage(const ResetEvent& event) override;
+    // Answers and marks the channel closed; the next publish opens it again.
+    void OnChannelClosed(amqp_channel_t channel) override;
 
 private:
+    // Opens the channel again when the broker closed it, and declares the
+    // exchange: the usual reason for the close is that the exchange is gone.
+    // True when it did. Call with the gate held.
+    bool RestoreClosedChannel(uint16_t channelId);
     void ReaderStep();
     void Poll();
     void SendHeartbeat();
@@ -65,6 +79,7 @@ private:
     Clock::time_point LastPoll;
     // Written by publishers and the reader: steady clock ticks.
     std::atomic<Clock::rep> LastSend{0};
+    std::atomic<bool> PollRequested{false};
 };
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <deque>
 #include <mutex>
@@ -32,6 +33,30 @@ public:
             Items.push_back(std::move(item));
         }
         Available.Release();
+    }
+
+    // Appends the item; on a bounded queue that is full, the oldest item
+    // makes room for it.
+    void AddEvictingOldest(T item) {
+        {
+            std::lock_guard<std::mutex> lock(Mutex);
+            if (Closed) return;
+            if (Bound >= 0 && Items.size() >= static_cast<uint32_t>(Bound)) {
+                if (Items.empty()) return;
+                // The count of the evicted item stands for the new one.
+                Items.pop_front();
+                Items.push_back(std::move(item));
+                return;
+            }
+            Items.push_back(std::move(item));
+        }
+        Available.Release();
+    }
+
+    // The items queued at the moment.
+    std::size_t Size() const {
+        std::lock_guard<std::mutex> lock(Mutex);
+        return Items.size();
     }
 
     // Waits up to timeoutMs (see Semaphore::Acquire) for a count. False, with
@@ -80,7 +105,7 @@ public:
     int32_t Takers() const { return Available.Waiters(); }
 
 private:
-    std::mutex Mutex;
+    mutable std::mutex Mutex;
     Semaphore Available;
     std::deque<T> Items;
     bool Closed = false;

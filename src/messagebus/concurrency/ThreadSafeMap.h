@@ -67,6 +67,23 @@ public:
         return true;
     }
 
+    // Erases every entry for which shouldErase(key, value) is true, in one
+    // hold of the lock, and returns their keys.
+    template <typename Predicate>
+    std::vector<K> EraseWhere(Predicate shouldErase) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        std::vector<K> erased;
+        for (auto entry = map_.begin(); entry != map_.end();) {
+            if (shouldErase(entry->first, static_cast<const V&>(entry->second))) {
+                erased.push_back(entry->first);
+                entry = map_.erase(entry);
+            } else {
+                ++entry;
+            }
+        }
+        return erased;
+    }
+
     // All keys in key order.
     std::vector<K> Keys() const {
         std::lock_guard<std::mutex> lock(mutex_);

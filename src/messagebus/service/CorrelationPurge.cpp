@@ -25,6 +25,12 @@ std::vector<std::string> PurgeCorrelationCallbacks(CorrIdCallbackMap& callbacks,
     return purged;
 }
 
+std::vector<std::string> ExpireCorrelationCallbacks(CorrIdCallbackMap& callbacks, int64_t nowNs) {
+    return callbacks.EraseWhere([nowNs](const std::string&, const CorrIdCallbackInfo& info) {
+        return info.ExpiresAt != 0 && info.ExpiresAt <= nowNs;
+    });
+}
+
 bool PurgeSchedule::Due(int64_t nowNs) {
     int64_t last = Last.load();
     if (AgeMs(nowNs, last) < PeriodMs) return false;

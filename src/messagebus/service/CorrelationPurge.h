@@ -15,6 +15,10 @@ namespace Korvane::Veldra::MessageBus {
 std::vector<std::string> PurgeCorrelationCallbacks(CorrIdCallbackMap& callbacks, int64_t nowNs,
                                                    int32_t maxAgeMs);
 
+// Erases every correlation callback whose request has timed out at nowNs
+// (ExpiresAt set and reached) and returns the keys it erased.
+std::vector<std::string> ExpireCorrelationCallbacks(CorrIdCallbackMap& callbacks, int64_t nowNs);
+
 // Decides when a purge is due: at most once in every period. Safe to ask from
 // several threads; exactly one of them gets true for a due period.
 class PurgeSchedule {

@@ -1,5 +1,7 @@
 #include "messagebus/service/MessageService.h"
 
+#include <algorithm>
+#include <chrono>
 #include <utility>
 
 #include "errors/AmqpException.h"
@@ -111,6 +113,7 @@ void MessageService::SendResponse(const MessageBase& request,
 std::shared_ptr<GenericMessage> MessageService::Request(MessageHeaders& headers,
                                                         const MessageBody& body, uint32_t timeoutMs,
                                                         bool mandatory) {
+    const auto started = std::chrono::steady_clock::now();
     // One queue per call: a late response can never reach the next caller.
     const auto waiter = std::make_shared<ResponseWaiter>();
     // Stamped first, so that even a message without one has its correlation id.
@@ -120,14 +123,53 @@ std::shared_ptr<GenericMessage> MessageService::Request(MessageHeaders& headers,
     // id that is waited on already keeps its waiter.
     SynchCallbackMap& waiters = *subscriber_->SynchCallbacks();
     waiters.Insert(correlationId, SynchCallbackInfo{waiter});
+    const auto forget = [&] {
+        waiters.EraseIf(correlationId,
+                        [&](const SynchCallbackInfo& info) { return info.Waiter == waiter; });
+    };
+    // Deliberate hardening: a response to a queue that is not bound again yet
+    // would be dropped by the broker; such a request waits for its queue,
+    // and counts that wait in its time-out.
+    if (!AwaitReplyRoute(timeoutMs) && !IsPublisherLost()) {
+        forget();
+        if (const auto logger = Logger()) {
+            logger->Error("Service did not respond | " + headers.routingKey);
+        }
+        return nullptr;
+    }
     try {
         publisher_->Send(headers, body, mandatory);
     } catch (...) {
-        waiters.EraseIf(correlationId,
-                        [&](const SynchCallbackInfo& info) { return info.Waiter == waiter; });
+        forget();
         throw;
     }
-    return WaitForResponse(correlationId, *waiter, timeoutMs, headers.routingKey);
+    return WaitForResponse(correlationId, *waiter, RemainingMs(started, timeoutMs),
+                           headers.routingKey);
+}
+
+uint32_t MessageService::RemainingMs(std::chrono::steady_clock::time_point started,
+                                     uint32_t timeoutMs) {
+    const auto spent = std::chrono::duration_cast<std::chrono::milliseconds>(
+                           std::chrono::steady_clock::now() - started)
+                           .count();
+    return spent >= int64_t{timeoutMs} ? 0 : timeoutMs - static_cast<uint32_t>(spent);
+}
+
+bool MessageService::AwaitReplyRoute(uint32_t waitMs) const {
+    // In slices, so that a publisher found lost meanwhile ends the wait: its
+    // send would fail at once, and the caller should hear so now.
+    constexpr uint32_t kSliceMs = 100;
+    const auto started = std::chrono::steady_clock::now();
+    for (;;) {
+        if (IsPublisherLost()) return false;
+        const uint32_t left = RemainingMs(started, waitMs);
+        if (subscriber_->WaitUntilBound(std::min(left, kSliceMs))) return true;
+        if (left <= kSliceMs) return false;
+    }
+}
+
+bool MessageService::IsPublisherLost() const {
+    return connectionManager_->IsPublisherLost();
 }
 
 std::shared_ptr<GenericMessage> MessageService::WaitForResponse(const std::string& correlationId,
@@ -195,7 +237,8 @@ void MessageService::RequestAsync(MessageHeaders& headers, const MessageBody& bo
                                   bool mandatory) {
     publisher_->Stamp(headers);
     const std::string correlationId = headers.correlationId;
-    subscriber_->RegisterCorrelationCallback(correlationId, responseRouter_, state);
+    subscriber_->RegisterCorrelationCallback(correlationId, responseRouter_, state,
+                                             defaultTimeoutMs_);
     try {
         publisher_->Send(headers, body, mandatory);
     } catch (...) {

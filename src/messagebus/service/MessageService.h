@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <memory>
 #include <mutex>
@@ -90,6 +91,8 @@ public:
     // Publishes and waits for the response: null when none came in time. A
     // mandatory request that no queue took throws AmqpException
     // (Veldra.AMQPErrorDequeueingMessage). "IgnoreResponse" is left as it is.
+    // After a reconnect the message goes only once the service's queue is
+    // bound again, within the same time-out.
     std::shared_ptr<GenericMessage> SendRequest(MessageBase& message);
     std::shared_ptr<GenericMessage> SendRequest(MessageBase& message, uint32_t timeoutMs,
                                                 bool mandatory = false);
@@ -107,9 +110,18 @@ public:
                                                                  bool mandatory = false);
     // Registers a one-shot callback for the correlation id, then publishes.
     // The response is routed with the state: by name, to the state callback
-    // when the state is not 0, else to the default callback.
+    // when the state is not 0, else to the default callback. The callback is
+    // dropped when no response came within DefaultTimeoutMs.
     void SendRequestAsync(MessageBase& message, uint32_t state, bool mandatory = false);
     void SendRequestAsync(const GenericMessage& message, uint32_t state, bool mandatory = false);
+
+    // Before a request whose reply must come back: waits up to waitMs until
+    // the service's queue and bindings are in place again after a reconnect
+    // or a channel reset. True when they are. False at once while the
+    // publisher connection is lost, since a send then fails at once anyway.
+    bool AwaitReplyRoute(uint32_t waitMs) const;
+    // True while the publisher connection is lost.
+    bool IsPublisherLost() const;
 
     // ---- Where responses go ----
     void SetDefaultResponseCallback(std::shared_ptr<Interfaces::IBroadcastCallback> callback);
@@ -153,6 +165,8 @@ private:
                                             uint32_t timeoutMs, bool mandatory);
     void RequestAsync(MessageHeaders& headers, const MessageBody& body, uint32_t state,
                       bool mandatory);
+    // What is left of timeoutMs since `started`, at least 0.
+    static uint32_t RemainingMs(std::chrono::steady_clock::time_point started, uint32_t timeoutMs);
     std::shared_ptr<GenericMessage> WaitForResponse(const std::string& correlationId,
                                                     ResponseWaiter& waiter, uint32_t timeoutMs,
                                                     const std::string& routingKey);

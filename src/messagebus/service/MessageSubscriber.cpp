@@ -1,5 +1,7 @@
 #include "messagebus/service/MessageSubscriber.h"
 
+#include <algorithm>
+#include <chrono>
 #include <utility>
 
 #include "messagebus/amqp/AmqpConnectionManager.h"
@@ -10,6 +12,8 @@ namespace Korvane::Veldra::MessageBus {
 namespace {
 
 constexpr const char* kUnhandledPoint = "UnhandledMessage";
+constexpr int32_t kExpiryPeriodMs = 100;
+constexpr int64_t kNsPerMs = 1000000;
 
 AmqpConnectionManager* ManagerOf(const MessageSubscriberBuilder& builder) {
     return builder.ConnectionManager != nullptr ? builder.ConnectionManager
@@ -32,6 +36,7 @@ MessageSubscriber::MessageSubscriber(const MessageSubscriberBuilder& builder)
       traceLogger_(builder.TraceLogger),
       unhandledPoint_(UnhandledPointOf(builder.TraceLogger)),
       lastPurge_(SteadyNowNs(), builder.CallbackMaxAgeMs),
+      lastExpiry_(SteadyNowNs(), kExpiryPeriodMs),
       callbackMaxAgeMs_(builder.CallbackMaxAgeMs),
       defaultCallback_(builder.DefaultCallback) {
     try {
@@ -124,10 +129,30 @@ void MessageSubscriber::Requeue(const std::string& consumerTag, uint64_t deliver
 
 void MessageSubscriber::RegisterCorrelationCallback(
     const std::string& correlationId, std::shared_ptr<Interfaces::IResponseCallback> callback,
-    uint32_t state) {
+    uint32_t state, uint32_t timeoutMs) {
     if (correlationId.empty()) return;
+    const int64_t now = SteadyNowNs();
+    // Deliberate hardening: entries of requests that timed out go now, not
+    // when a purge by age comes hours later, so that an outage, in which no
+    // reply comes, cannot pile them up.
+    Expire(now);
+    const int64_t expiresAt = timeoutMs == 0 ? 0 : now + int64_t{timeoutMs} * kNsPerMs;
     corrIdCallbacks_->InsertOrAssign(correlationId,
-                                     CorrIdCallbackInfo{std::move(callback), state, SteadyNowNs()});
+                                     CorrIdCallbackInfo{std::move(callback), state, now, expiresAt});
+}
+
+void MessageSubscriber::Expire(int64_t nowNs) {
+    if (lastExpiry_.Due(nowNs)) ExpireCorrelationCallbacks(*corrIdCallbacks_, nowNs);
+}
+
+bool MessageSubscriber::WaitUntilBound(uint32_t timeoutMs) const {
+    const auto deadline = std::chrono::steady_clock::now() + std::chrono::milliseconds(timeoutMs);
+    for (const auto& consumer : consumers_) {
+        const auto left = std::max(deadline - std::chrono::steady_clock::now(),
+                                   std::chrono::steady_clock::duration::zero());
+        if (!consumer->WaitBound(left)) return false;
+    }
+    return true;
 }
 
 void MessageSubscriber::RegisterMessageCallback(
@@ -230,6 +255,7 @@ void MessageSubscriber::HandleUnhandled(const GenericMessage& message) {
 
 void MessageSubscriber::Purge() {
     const int64_t now = SteadyNowNs();
+    Expire(now);
     if (!lastPurge_.Due(now)) return;
     const std::vector<std::string> purged =
         PurgeCorrelationCallbacks(*corrIdCallbacks_, now, callbackMaxAgeMs_);

@@ -47,9 +47,17 @@ public:
     void Requeue(const std::string& consumerTag, uint64_t deliveryTag);
 
     // Inserts, or replaces callback, state and time. An empty id does nothing.
+    // With a time-out the entry goes once its request has timed out: at the
+    // next registration or arriving message after that, or when the request's
+    // owner erases it. Entries that timed out are erased here first.
     void RegisterCorrelationCallback(const std::string& correlationId,
                                      std::shared_ptr<Interfaces::IResponseCallback> callback,
-                                     uint32_t state);
+                                     uint32_t state, uint32_t timeoutMs = 0);
+
+    // Waits up to timeoutMs until every consumer's queue and bindings are in
+    // place; true when they are. After a reconnect or a channel reset the
+    // queue may not exist until its rebind is through.
+    bool WaitUntilBound(uint32_t timeoutMs) const;
     // Inserts; an existing name keeps its entry and is logged. An empty name
     // does nothing.
     void RegisterMessageCallback(const std::string& messageName,
@@ -82,6 +90,8 @@ private:
     void HandleMessage(const std::shared_ptr<GenericMessage>& message);
     void HandleUnhandled(const GenericMessage& message);
     void Purge();
+    // Erases the correlation callbacks whose requests timed out.
+    void Expire(int64_t nowNs);
     // The logger and its "UnhandledMessage" point, as one consistent pair.
     std::shared_ptr<Interfaces::ITraceLogger> Logger(TracePoint& unhandledPoint);
     void LogError(const std::string& text);
@@ -100,6 +110,8 @@ private:
     TracePoint unhandledPoint_;
     std::unique_ptr<MessageHandlerPool> handlerPool_;
     PurgeSchedule lastPurge_;
+    // Expired correlation callbacks are looked for at most this often.
+    PurgeSchedule lastExpiry_;
     const int32_t callbackMaxAgeMs_;
     const std::shared_ptr<Interfaces::IBroadcastCallback> defaultCallback_;
 

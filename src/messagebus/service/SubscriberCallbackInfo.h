@@ -27,6 +27,9 @@ struct CorrIdCallbackInfo {
     uint32_t State = 0;
     // Steady clock, nanoseconds: when the callback was registered.
     int64_t CreatedAt = 0;
+    // Steady clock, nanoseconds: when its request times out and the entry
+    // goes; 0 when only the purge by age removes it.
+    int64_t ExpiresAt = 0;
 };
 
 // The handler of every message with its name; the entry stays until removed.

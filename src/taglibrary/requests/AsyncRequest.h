@@ -30,11 +30,23 @@ public:
     // any more, and the request is then dropped from the map.
     virtual bool Complete(std::shared_ptr<GenericMessage> reply) = 0;
 
+    // True when the caller blocks until the reply or its time-out (the
+    // console family): such a request may wait, within its time-out, for the
+    // reply queue to be bound again before it is sent. A caller that must
+    // never block gets an error at once instead.
+    virtual bool CallerWaits() const { return false; }
+
+    // The correlation id of the message sent, set before the request is
+    // filed, so that its finish can drop a correlation entry left behind.
+    void SetCorrelationId(std::string id) { correlationId_ = std::move(id); }
+    const std::string& CorrelationId() const { return correlationId_; }
+
     void SetResponse(std::shared_ptr<GenericMessage> reply) { response_ = std::move(reply); }
     const std::shared_ptr<GenericMessage>& Response() const { return response_; }
 
 private:
     std::shared_ptr<GenericMessage> response_;
+    std::string correlationId_;
 };
 
 }  // namespace Korvane::Veldra::TagLibrary

@@ -14,6 +14,7 @@ public:
     // its name without inserts. A body that does not parse throws.
     int32_t CheckResult(const TagIngestion::Errors& errors, std::string& error) override;
     bool Complete(std::shared_ptr<GenericMessage> reply) override;
+    bool CallerWaits() const override { return inner_->CallerWaits(); }
 
 private:
     const std::shared_ptr<AsyncRequest> inner_;

@@ -11,6 +11,7 @@ public:
     ConsoleAsyncRequest() : completed_(true, false) {}
 
     bool Complete(std::shared_ptr<GenericMessage> reply) override;
+    bool CallerWaits() const override { return true; }
     // Waits for the reply. The outcome is of no use to the caller: the finish
     // half sees whether a reply came.
     void Wait(uint32_t timeoutMs) { completed_.Wait(timeoutMs); }

@@ -4,10 +4,12 @@
 
 #include "support/ScratchDirectory.h"
 
+#include <utility>
+
 namespace Korvane::Veldra::Testing {
 
-SuiteTagService::SuiteTagService(const std::string& stem)
-    : directory_(std::make_unique<ScratchDirectory>(stem)) {}
+SuiteTagService::SuiteTagService(const std::string& stem, std::vector<std::string> extraArgs)
+    : directory_(std::make_unique<ScratchDirectory>(stem)), extraArgs_(std::move(extraArgs)) {}
 
 SuiteTagService::~SuiteTagService() {
     Stop();
@@ -16,6 +18,7 @@ SuiteTagService::~SuiteTagService() {
 void SuiteTagService::Start() {
     TagServiceOptions options;
     options.store = directory_->Path() + "/tags.db";
+    options.extraArgs = extraArgs_;
     process_ = std::make_unique<TagServiceProcess>(options);
 }
 

@@ -3,6 +3,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "support/TagServiceProcess.h"
 
@@ -16,8 +17,9 @@ class ScratchDirectory;
 // would show every test as skipped and ctest would pass the run.
 class SuiteTagService {
 public:
-    // `stem` names the scratch directory of the store.
-    explicit SuiteTagService(const std::string& stem);
+    // `stem` names the scratch directory of the store; `extraArgs` go to
+    // the service's command line.
+    explicit SuiteTagService(const std::string& stem, std::vector<std::string> extraArgs = {});
     ~SuiteTagService();
 
     void Start();
@@ -30,6 +32,7 @@ public:
 private:
     std::unique_ptr<ScratchDirectory> directory_;
     std::unique_ptr<TagServiceProcess> process_;
+    std::vector<std::string> extraArgs_;
     bool attempted_ = false;
     bool ready_ = false;
 };

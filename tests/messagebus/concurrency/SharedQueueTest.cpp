@@ -56,6 +56,17 @@ TEST(SharedQueue, BoundDropsSilentlyWhileUnboundedKeepsAll) {
     }
 }
 
+TEST(SharedQueue, EvictingAddKeepsTheNewestWithinTheBound) {
+    SharedQueue<int> ring(3);
+    for (int i = 0; i < 10; ++i) ring.AddEvictingOldest(i);
+    EXPECT_EQ(ring.Size(), 3u);
+    std::vector<int> taken;
+    for (int item = 0; ring.TryTake(item, 0);) taken.push_back(item);
+    // One count per item kept: nothing more to take, nothing lost of the three.
+    EXPECT_EQ(taken, (std::vector<int>{7, 8, 9}));
+    EXPECT_EQ(ring.Size(), 0u);
+}
+
 TEST(SharedQueue, StoredErrorComesAfterTheItems) {
     SharedQueue<std::string> queue;
     queue.Add("first");

@@ -30,6 +30,19 @@ TEST(CorrelationPurge, ErasesEntriesAtLeastTheMaximumAgeInWholeMilliseconds) {
     EXPECT_THAT(callbacks.Keys(), ::testing::ElementsAre("almost", "fresh", "future"));
 }
 
+TEST(CorrelationPurge, ExpiryErasesTimedOutRequestsAndLeavesTheRest) {
+    const int64_t now = 10000 * kMs;
+    CorrIdCallbackMap callbacks;
+    callbacks.Insert("no time-out", CorrIdCallbackInfo{nullptr, 0, 0, 0});
+    callbacks.Insert("timed out", CorrIdCallbackInfo{nullptr, 0, 0, now - 1});
+    callbacks.Insert("times out now", CorrIdCallbackInfo{nullptr, 0, 0, now});
+    callbacks.Insert("waiting", CorrIdCallbackInfo{nullptr, 0, 0, now + 1});
+
+    EXPECT_THAT(ExpireCorrelationCallbacks(callbacks, now),
+                ::testing::ElementsAre("timed out", "times out now"));
+    EXPECT_THAT(callbacks.Keys(), ::testing::ElementsAre("no time-out", "waiting"));
+}
+
 TEST(CorrelationPurge, ScheduleIsDueOncePerPeriod) {
     PurgeSchedule schedule(0, 1000);
     const std::vector<std::pair<int64_t, bool>> steps = {{999 * kMs, false},
