@@ -79,8 +79,12 @@ int32_t Client::GetPath(const std::shared_ptr<TagData>& tag, std::string& path,
 }
 
 int32_t Client::ExportedType(const TagData& tag) const {
+    return TypeToExported(DataTypeOf(tag));
+}
+
+std::optional<TagDataType> Client::DataTypeOf(const TagData& tag) const {
     std::lock_guard<std::mutex> lock(mutex_);
-    return TypeToExported(tag.dataType);
+    return tag.dataType;
 }
 
 std::vector<std::string> Client::CopyPaths(const std::vector<std::shared_ptr<TagData>>& tags) const {

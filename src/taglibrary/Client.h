@@ -183,6 +183,8 @@ public:
     // The exported type number of a record that the caller knows to be live;
     // no verbose line.
     int32_t ExportedType(const TagData& tag) const;
+    // The client's type of a record: unset, None and the six types apart.
+    std::optional<TagDataType> DataTypeOf(const TagData& tag) const;
 
     void SetVerbose(bool verbose) { verbose_.store(verbose, std::memory_order_relaxed); }
     bool Verbose() const { return verbose_.load(std::memory_order_relaxed); }

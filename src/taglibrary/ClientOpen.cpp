@@ -35,7 +35,7 @@ int32_t Client::OpenOrCreateTag(uint64_t instanceId, const std::string& path,
     const auto& records = response.Tags();
     if (records && records->size() == 1) {
         found = true;
-        const std::optional<TagDataType> serverType = records->front().type;
+        const std::optional<TagDataType> serverType = MessageValueToType(records->front().type);
         if (serverType == dataType) {
             tag = MapTag(instanceId, path, dataType);
             return 0;

@@ -7,6 +7,7 @@
 #include "messagelibrary/taginfo/TagInfoQueryTagsRequest.h"
 #include "messagelibrary/taginfo/TagInfoQueryTagsResponse.h"
 #include "taglibrary/Client.h"
+#include "taglibrary/TagTypes.h"
 
 namespace Korvane::Veldra::TagLibrary {
 
@@ -50,7 +51,8 @@ int32_t Client::FinishListTags(uint64_t instanceId, uint32_t requestId,
     // A list opens what it returns: one more session per record.
     std::lock_guard<std::mutex> lock(mutex_);
     for (const auto& record : records) {
-        tags.push_back(MapTagLocked(instanceId, record.path.value_or(""), record.type));
+        tags.push_back(
+            MapTagLocked(instanceId, record.path.value_or(""), MessageValueToType(record.type)));
     }
     return 0;
 }

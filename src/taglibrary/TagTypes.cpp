@@ -17,6 +17,10 @@ std::optional<TagDataType> MessageValueToType(int32_t value) {
     return TagDataType::None;
 }
 
+std::optional<TagDataType> MessageValueToType(const std::optional<TagDataType>& field) {
+    return MessageValueToType(field ? static_cast<int32_t>(*field) : 0);
+}
+
 std::string TypeShortName(std::optional<TagDataType> type) {
     if (!type) return "none";
     switch (*type) {

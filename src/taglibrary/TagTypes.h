@@ -20,6 +20,9 @@ std::optional<TagDataType> ExportedToType(int32_t exported);
 int32_t TypeToExported(std::optional<TagDataType> type);
 // 1 to 6 give the type; anything else gives a present None.
 std::optional<TagDataType> MessageValueToType(int32_t value);
+// The type field of a received record as the client takes it: a missing or
+// null field, like a number out of range, is a present None.
+std::optional<TagDataType> MessageValueToType(const std::optional<TagDataType>& field);
 // "Double", "Int", "String", "Boolean"; every other value, absent included,
 // reads "none". Used only for the inserts of the conflicting-types error.
 std::string TypeShortName(std::optional<TagDataType> type);

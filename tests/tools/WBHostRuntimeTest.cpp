@@ -44,7 +44,7 @@ TEST_F(WBHostVariantFailures, FailingCallsReturnTheStatusAndLeaveTheVariant) {
     EXPECT_EQ(WbVariantGetType(variant), WbVariantDouble);
     EXPECT_EQ(*static_cast<double*>(WbVariantGetDataPtr(variant)), 1.5);
 
-    // The seventh call acts again.
+    // The seventh call acts again, and the variant takes the handle over.
     ASSERT_EQ(WbVariantSetLStr(variant, text), 0);
     EXPECT_EQ(WbVariantGetType(variant), WbVariantLStr);
     // A failing call on a string variant keeps its copy of the text.
@@ -53,8 +53,25 @@ TEST_F(WBHostVariantFailures, FailingCallsReturnTheStatusAndLeaveTheVariant) {
     const WBStrHandle kept = *static_cast<WBStrHandle*>(WbVariantGetDataPtr(variant));
     ASSERT_NE(kept, nullptr);
     EXPECT_EQ((*kept)->cnt, 3);
+    WbVariantFree(variant);
+}
 
-    WBDisposeHandle(reinterpret_cast<WBHandle>(text));
+TEST(WBHostVariants, AStringVariantTakesOnlyAHandleOfTheHostsMemoryOver) {
+    WbVariant* variant = WbVariantNew();
+    // A handle built in the caller's own memory, as a host would never free it.
+    std::vector<unsigned char> block(sizeof(int32_t) + 3);
+    auto* foreign = reinterpret_cast<WBStr*>(block.data());
+    foreign->cnt = 3;
+    std::memcpy(foreign->str, "abc", 3);
+    EXPECT_EQ(WbVariantSetLStr(variant, &foreign), 1);
+    EXPECT_EQ(WbVariantGetType(variant), WbVariantEmpty);
+
+    // A host handle is taken over: the variant frees it with itself.
+    const WBStrHandle text = NewText("abc");
+    ASSERT_EQ(WbVariantSetLStr(variant, text), 0);
+    EXPECT_EQ(*static_cast<WBStrHandle*>(WbVariantGetDataPtr(variant)), text);
+    ASSERT_EQ(WbVariantSetLStr(variant, nullptr), 0);  // the empty string
+    EXPECT_EQ((**static_cast<WBStrHandle*>(WbVariantGetDataPtr(variant)))->cnt, 0);
     WbVariantFree(variant);
 }
 

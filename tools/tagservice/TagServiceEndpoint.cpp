@@ -198,6 +198,9 @@ void TagServiceEndpoint::Unhandled(const Received& received) {
 
 void TagServiceEndpoint::Publish(MessageBus::MessageBase& message) {
     try {
+        // An answer to a request handled right after a broker restart waits
+        // for the publisher to be back, rather than being lost.
+        service_.AwaitPublisher(service_.DefaultTimeoutMs());
         service_.Publish(message);
     } catch (const std::exception& error) {
         WriteLogLine(std::cerr, "cannot publish " + message.MessageType() + ": " + error.what());

@@ -15,6 +15,15 @@ TagServiceHost::~TagServiceHost() {
     StopService();
 }
 
+void TagServiceHost::Start(const VeldraUtilities::ManagedServiceOptions& options) {
+    Run(options);
+    if (options.standalone) {
+        GoLive();
+    } else {
+        Register();
+    }
+}
+
 void TagServiceHost::GoLive() {
     ManagedServiceBase::GoLive();
     if (State() == VeldraMessageLibrary::ServiceState::Live) {

@@ -20,6 +20,11 @@ public:
 
     void GoLive() override;
 
+    // Runs the base, then does what the base leaves to the service itself:
+    // standalone it goes live at once; under a manager it registers now
+    // rather than wait for the manager's next status request.
+    void Start(const VeldraUtilities::ManagedServiceOptions& options);
+
 private:
     const std::string readyText_;
 };

@@ -105,7 +105,7 @@ int Run(const TagService::ServiceOptions& options) {
                 ", store " +
                 (options.storeFile.empty() ? std::string("memory") : options.storeFile) + ")");
         const VeldraUtilities::ManagedServiceOptions hostOptions = HostOptions(options, *manager);
-        host->Run(hostOptions);
+        host->Start(hostOptions);
         if (!hostOptions.standalone) {
             std::cout << TagService::kManagedLine << " (control queue "
                       << host->GetControlQueueName() << ", service guid " << host->ServiceGuid()

@@ -7,6 +7,7 @@
 #include <cstring>
 #include <map>
 #include <mutex>
+#include <set>
 #include <string>
 
 namespace {
@@ -65,6 +66,25 @@ struct Signals {
     uint32_t next = 1;
 };
 
+// The handles WBNewHandleClr made and WBDisposeHandle has not freed yet: a
+// function that takes a handle over checks that it belongs to this memory
+// manager, as a real host would free or resize it.
+struct LiveHandles {
+    std::mutex mutex;
+    std::set<WBHandle> handles;
+};
+
+LiveHandles& HandleTable() {
+    static LiveHandles* table = new LiveHandles();
+    return *table;
+}
+
+bool IsLiveHandle(WBHandle handle) {
+    auto& table = HandleTable();
+    std::lock_guard<std::mutex> lock(table.mutex);
+    return table.handles.count(handle) != 0;
+}
+
 Signals& SignalTable() {
     static Signals* table = new Signals();
     return *table;
@@ -94,6 +114,9 @@ WBHandle WBNewHandleClr(size_t size) {
         std::free(handle);
         return nullptr;
     }
+    auto& table = HandleTable();
+    std::lock_guard<std::mutex> lock(table.mutex);
+    table.handles.insert(handle);
     return handle;
 }
 
@@ -112,6 +135,11 @@ int32_t WBResizeHandleClr(WBHandle handle, size_t size) {
 
 void WBDisposeHandle(WBHandle handle) {
     if (handle == nullptr) return;
+    {
+        auto& table = HandleTable();
+        std::lock_guard<std::mutex> lock(table.mutex);
+        table.handles.erase(handle);
+    }
     if (*handle != nullptr) std::free(HeaderOf(*handle));
     std::free(handle);
 }
@@ -255,16 +283,19 @@ int32_t WbVariantSetBool(WbVariant* variant, uint8_t value) {
 
 int32_t WbVariantSetLStr(WbVariant* variant, WBStrHandle value) {
     if (const int32_t failure = TakeVariantFailure()) return failure;
+    // The variant takes the handle over and frees it with itself, as the
+    // host does: it must come from this memory manager. A null handle is the
+    // empty string.
+    const auto handle = reinterpret_cast<WBHandle>(value);
+    if (handle != nullptr && !IsLiveHandle(handle)) return 1;
     if (Reset(variant, WbVariantLStr) != 0) return 1;
-    // The variant keeps a copy of its own.
-    const int32_t length = (value != nullptr && *value != nullptr) ? (*value)->cnt : 0;
-    const size_t size = sizeof(int32_t) + (length > 0 ? static_cast<size_t>(length) : 1);
-    WBHandle copy = WBNewHandleClr(size);
-    if (copy == nullptr) return 2;
-    auto* block = static_cast<WBStr*>(*copy);
-    if (length > 0) std::memcpy(block->str, (*value)->str, static_cast<size_t>(length));
-    block->cnt = length > 0 ? length : 0;
-    variant->text = reinterpret_cast<WBStrHandle>(copy);
+    if (handle == nullptr) {
+        WBHandle empty = WBNewHandleClr(sizeof(int32_t));
+        if (empty == nullptr) return 2;
+        variant->text = reinterpret_cast<WBStrHandle>(empty);
+        return 0;
+    }
+    variant->text = value;
     return 0;
 }
 

@@ -40,6 +40,18 @@ std::vector<AmqpBinding> AmqpChannel::GetBindings() const {
     return Bindings;
 }
 
+void AmqpChannel::AddConsumerTag(std::string tag) {
+    std::lock_guard<std::recursive_mutex> lock(BindingMutex);
+    ConsumerTags.push_back(std::move(tag));
+}
+
+std::vector<std::string> AmqpChannel::TakeConsumerTags() {
+    std::lock_guard<std::recursive_mutex> lock(BindingMutex);
+    std::vector<std::string> tags;
+    tags.swap(ConsumerTags);
+    return tags;
+}
+
 bool AmqpChannel::TryTakeReturnEvent(ResetEvent& out) {
     return ReturnEvents->TryTake(out, 0);
 }

@@ -68,6 +68,11 @@ public:
     // Takes a waiting notice without waiting.
     bool TryTakeReturnEvent(ResetEvent& out);
 
+    // The broker's tags of the consumers started on this channel; a new
+    // connection or a reopened channel has none of them any more.
+    void AddConsumerTag(std::string tag);
+    std::vector<std::string> TakeConsumerTags();
+
     // ---- Whether the queue and bindings are in place on the broker ----
     // A reply sent to a queue that a lost connection took with it (an
     // auto-delete queue goes with its last consumer) is dropped by the
@@ -98,6 +103,7 @@ public:
 private:
     mutable std::recursive_mutex BindingMutex;
     std::vector<AmqpBinding> Bindings;
+    std::vector<std::string> ConsumerTags;  // guarded by BindingMutex
 
     // Guards the two below; BoundChanged is notified when Bound turns true.
     mutable std::mutex BoundMutex;

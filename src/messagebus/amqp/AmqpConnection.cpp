@@ -224,11 +224,18 @@ void AmqpConnection::Establish(bool untilDeadline) {
         Connection = state.release();
         Socket = socket;
         ClosedChannels.clear();
+        std::lock_guard<std::mutex> restored(RestoredMutex);
         ConnectionLost = false;
     }
+    Restored.notify_all();
     // The old state goes outside the gate: nobody can reach it any more.
     replaced.reset();
     Log("Successfully connected to AMQP.");
+}
+
+bool AmqpConnection::WaitUntilConnected(std::chrono::milliseconds timeout) {
+    std::unique_lock<std::mutex> lock(RestoredMutex);
+    return Restored.wait_for(lock, timeout, [this] { return !ConnectionLost.load(); });
 }
 
 void AmqpConnection::DropConnection() {

@@ -76,6 +76,9 @@ public:
     // True from the moment a reader found the connection lost until a new
     // one is in place. Read without the gate.
     bool IsLost() const { return ConnectionLost.load(); }
+    // Waits up to `timeout` while the connection is lost; true once it is
+    // connected again (at once when it is not lost).
+    bool WaitUntilConnected(std::chrono::milliseconds timeout);
 
 protected:
     // As the public constructor, with the TLS start-up library given: tests
@@ -158,6 +161,9 @@ protected:
     // Set by a reader that found the connection lost, cleared when a new one
     // is in place: calls that would only meet the dead socket fail at once.
     std::atomic<bool> ConnectionLost{false};
+    // Notified, with RestoredMutex, when a new connection is in place.
+    std::mutex RestoredMutex;
+    std::condition_variable Restored;
     // Channels that the broker closed on the current connection and that were
     // answered with close-ok; a new connection opens every channel again.
     // Guarded by the gate.

@@ -1,5 +1,6 @@
 #include "messagebus/amqp/AmqpConnectionManager.h"
 
+#include <chrono>
 #include <utility>
 
 #include "messagebus/amqp/AmqpConsumerConnection.h"
@@ -149,10 +150,15 @@ void AmqpConnectionManager::SetQos(const std::shared_ptr<AmqpChannel>& channel,
 
 void AmqpConnectionManager::AddBinding(const std::shared_ptr<AmqpChannel>& channel,
                                        const std::string& queueName,
-                                       const std::vector<std::string>& keys, bool noAck) {
+                                       const std::vector<std::string>& keys, bool noAck,
+                                       bool consume) {
     const uint16_t id = IdOf(channel);
-    if (channel->AddBinding(queueName, keys)) {
-        GetConsumerConnection()->BindAndConsume(id, queueName, keys, noAck);
+    if (!channel->AddBinding(queueName, keys)) return;
+    const auto connection = GetConsumerConnection();
+    if (consume) {
+        channel->AddConsumerTag(connection->BindAndConsume(id, queueName, keys, noAck));
+    } else {
+        connection->BindQueue(id, queueName, keys);
     }
 }
 
@@ -165,12 +171,33 @@ void AmqpConnectionManager::RemoveBinding(const std::shared_ptr<AmqpChannel>& ch
     }
 }
 
-void AmqpConnectionManager::RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck) {
+void AmqpConnectionManager::RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck,
+                                      bool consume) {
+    const uint16_t id = IdOf(channel);
+    const auto consumer = GetConsumerConnection();
+    channel->TakeConsumerTags();
+    for (const AmqpBinding& binding : channel->GetBindings()) {
+        if (consume) {
+            channel->AddConsumerTag(
+                consumer->BindAndConsume(id, binding.QueueName, binding.Keys, noAck));
+        } else {
+            consumer->BindQueue(id, binding.QueueName, binding.Keys);
+        }
+    }
+}
+
+void AmqpConnectionManager::ConsumeAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck) {
     const uint16_t id = IdOf(channel);
     const auto consumer = GetConsumerConnection();
     for (const AmqpBinding& binding : channel->GetBindings()) {
-        consumer->BindAndConsume(id, binding.QueueName, binding.Keys, noAck);
+        channel->AddConsumerTag(consumer->Consume(id, binding.QueueName, noAck));
     }
+}
+
+void AmqpConnectionManager::CancelAll(const std::shared_ptr<AmqpChannel>& channel) {
+    const uint16_t id = IdOf(channel);
+    const auto consumer = GetConsumerConnection();
+    for (const std::string& tag : channel->TakeConsumerTags()) consumer->Cancel(id, tag);
 }
 
 void AmqpConnectionManager::Ack(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag) {
@@ -216,6 +243,11 @@ void AmqpConnectionManager::CloseConsumerChannel(const std::shared_ptr<AmqpChann
 
 void AmqpConnectionManager::ConsumerConnectionLost() {
     if (const auto publisher = Existing(Publisher)) publisher->PollSoon();
+}
+
+bool AmqpConnectionManager::AwaitPublisher(uint32_t timeoutMs) {
+    const auto publisher = Existing(Publisher);
+    return publisher && publisher->WaitUntilConnected(std::chrono::milliseconds(timeoutMs));
 }
 
 bool AmqpConnectionManager::IsPublisherLost() {

@@ -64,14 +64,22 @@ public:
                       bool durable, bool exclusive, bool autoDelete);
     void SetQos(const std::shared_ptr<AmqpChannel>& channel, uint32_t prefetchSize,
                 uint16_t prefetchCount, bool global);
-    // Binds and consumes only when the channel did not record this binding.
+    // Binds, and with `consume` starts a consumer on the queue, only when the
+    // channel did not record this binding.
     void AddBinding(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
-                    const std::vector<std::string>& keys, bool noAck);
+                    const std::vector<std::string>& keys, bool noAck, bool consume = true);
     // Unbinds only when the channel had recorded this binding.
     void RemoveBinding(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
                        const std::vector<std::string>& keys);
-    // Binds and consumes every recorded binding of the channel again.
-    void RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck);
+    // Binds every recorded binding of the channel again, and with `consume`
+    // starts a consumer for each; the consumers of before are gone.
+    void RebindAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck, bool consume = true);
+    // Starts a consumer on the queue of each recorded binding, as binding
+    // while consuming would have: the broker delivers from here on.
+    void ConsumeAll(const std::shared_ptr<AmqpChannel>& channel, bool noAck);
+    // Cancels every consumer of the channel: what arrives from here on stays
+    // in the broker's queue.
+    void CancelAll(const std::shared_ptr<AmqpChannel>& channel);
     void Ack(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag);
     void Requeue(const std::shared_ptr<AmqpChannel>& channel, uint64_t deliveryTag);
     // Start and Stop of the consumer connection.
@@ -86,6 +94,9 @@ public:
     void CloseConsumerChannel(const std::shared_ptr<AmqpChannel>& channel);
     // True while the publisher connection is lost, or was never made.
     bool IsPublisherLost();
+    // Waits up to timeoutMs while the publisher connection is lost; true when
+    // it is connected.
+    bool AwaitPublisher(uint32_t timeoutMs);
     // The consumer connection was found lost: the publisher's reader looks at
     // its own connection at once instead of within the second.
     void ConsumerConnectionLost();

@@ -75,7 +75,8 @@ void AmqpConsumer::DeclareQueue() {
 }
 
 void AmqpConsumer::Bind(const std::vector<std::string>& keys) {
-    Manager->AddBinding(Channel, QueueName, keys, !ManualAck);
+    std::lock_guard<std::mutex> lock(ConsumeMutex);
+    Manager->AddBinding(Channel, QueueName, keys, !ManualAck, BrokerConsuming);
 }
 
 void AmqpConsumer::Unbind(const std::vector<std::string>& keys) {
@@ -83,12 +84,51 @@ void AmqpConsumer::Unbind(const std::vector<std::string>& keys) {
 }
 
 void AmqpConsumer::StartConsuming() {
+    {
+        // Deliberate hardening: the broker delivers only from here on, so
+        // that what arrives before the start waits in its queue, not in
+        // this process's memory.
+        std::lock_guard<std::mutex> lock(ConsumeMutex);
+        if (!BrokerConsuming && QueueCancelled) {
+            // The broker deleted the auto-delete queue with its last
+            // consumer: declared and bound anew, with consumers this time.
+            const uint64_t generation = Channel->Generation();
+            DeclareQueue();
+            Manager->RebindAll(Channel, !ManualAck, true);
+            Channel->MarkBound(generation);
+            QueueCancelled = false;
+            BrokerConsuming = true;
+        } else if (!BrokerConsuming) {
+            Manager->ConsumeAll(Channel, !ManualAck);
+            BrokerConsuming = true;
+        }
+    }
     Consuming = true;
     Manager->Start();
 }
 
 void AmqpConsumer::StopConsuming() {
     Consuming = false;
+    {
+        // What arrives from here on stays in the broker's queue; what was
+        // delivered already is still handled.
+        std::lock_guard<std::mutex> lock(ConsumeMutex);
+        if (BrokerConsuming) {
+            BrokerConsuming = false;
+            if (!Durable) {
+                // An auto-delete queue goes with its last consumer; only a
+                // durable one keeps what arrives meanwhile.
+                QueueCancelled = true;
+                Channel->MarkUnbound();
+            }
+            try {
+                Manager->CancelAll(Channel);
+            } catch (const std::exception& error) {
+                // A lost connection took the consumers with it.
+                Manager->SetLastError(AsVeldraException(error));
+            }
+        }
+    }
     Manager->Stop();
 }
 
@@ -133,10 +173,12 @@ void AmqpConsumer::RebindLoop() {
             // Queue first, then every binding with its consume: this is what
             // restores the consumer on a new connection or channel.
             try {
+                std::lock_guard<std::mutex> lock(ConsumeMutex);
                 DeclareQueue();
                 // A reopened channel or a new connection has lost the prefetch.
                 Manager->SetQos(Channel, 0, PrefetchCount, false);
-                Manager->RebindAll(Channel, !ManualAck);
+                Manager->RebindAll(Channel, !ManualAck, BrokerConsuming);
+                QueueCancelled = false;
                 Channel->MarkBound(generation);
                 backoff.Reset();
                 failed = false;

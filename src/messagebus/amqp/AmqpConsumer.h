@@ -33,14 +33,18 @@ public:
     AmqpConsumer(const AmqpConsumer&) = delete;
     AmqpConsumer& operator=(const AmqpConsumer&) = delete;
 
-    // Records the binding with the manager, which binds and consumes only
-    // when it is new.
+    // Records the binding with the manager, which binds only when it is new,
+    // and consumes too while the consumer is started.
     void Bind(const std::vector<std::string>& keys);
     // Unbinds only a recorded binding.
     void Unbind(const std::vector<std::string>& keys);
-    // Lets the handling thread run and counts a Start of the connection.
+    // Starts the broker's deliveries (a consumer for each binding), lets the
+    // handling thread run and counts a Start of the connection.
     void StartConsuming();
-    // Counts a Stop of the connection; what is queued is still handled.
+    // Cancels the broker's deliveries and counts a Stop of the connection;
+    // what was delivered already is still handled. A durable queue keeps
+    // what arrives meanwhile; an auto-delete queue goes with its consumers,
+    // and the next start declares and binds it again.
     void StopConsuming();
     void Ack(uint64_t deliveryTag);
     void Requeue(uint64_t deliveryTag);
@@ -95,6 +99,13 @@ private:
     const uint16_t PrefetchCount;
     // Guards TraceLogger and RawMessagesPoint.
     std::mutex LoggerMutex;
+    // Held across the binds, consumes and cancels, so that the broker has a
+    // consumer for each binding exactly while the consumer is started.
+    std::mutex ConsumeMutex;
+    bool BrokerConsuming = false;  // guarded by ConsumeMutex
+    // An auto-delete queue whose consumers were cancelled: the broker has
+    // deleted it. Guarded by ConsumeMutex.
+    bool QueueCancelled = false;
 };
 
 }  // namespace Korvane::Veldra::MessageBus

@@ -119,31 +119,62 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
     }
 }
 
-void AmqpConsumerConnection::BindAndConsume(uint16_t channelId, const std::string& queueName,
-                                            const std::vector<std::string>& keys, bool noAck) {
-    const std::string key = BindingKey(keys);
-    const std::string bindContext = "Error binding queue. Channel ID: " + ChannelText(channelId) +
-                                    ". Queue name: \"" + queueName + "\". Exchange name: \"" +
-                                    ExchangeName + "\". Binding key: \"" + key + "\". ";
-    const std::string consumeContext =
-        "Error performing basic consume. Channel ID: " + ChannelText(channelId) +
-        ". Queue name: \"" + queueName + "\". ";
+std::string AmqpConsumerConnection::BindAndConsume(uint16_t channelId,
+                                                   const std::string& queueName,
+                                                   const std::vector<std::string>& keys,
+                                                   bool noAck) {
     ControlGateGuard gate(Gate);
-    RequireConnection(ErrorCodes::kBindingQueue, bindContext);
+    BindQueue(channelId, queueName, keys);
+    return Consume(channelId, queueName, noAck);
+}
+
+void AmqpConsumerConnection::BindQueue(uint16_t channelId, const std::string& queueName,
+                                       const std::vector<std::string>& keys) {
+    const std::string key = BindingKey(keys);
+    const std::string context = "Error binding queue. Channel ID: " + ChannelText(channelId) +
+                                ". Queue name: \"" + queueName + "\". Exchange name: \"" +
+                                ExchangeName + "\". Binding key: \"" + key + "\". ";
+    ControlGateGuard gate(Gate);
+    RequireConnection(ErrorCodes::kBindingQueue, context);
     ReopenIfClosed(channelId);
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
         amqp_queue_bind(Connection, channelId, TextBytes(queueName),
                         amqp_cstring_bytes(ExchangeName.c_str()), TextBytes(key), amqp_empty_table);
     }
-    CheckChannelReply(channelId, ErrorCodes::kBindingQueue, bindContext);
+    CheckChannelReply(channelId, ErrorCodes::kBindingQueue, context);
+}
+
+std::string AmqpConsumerConnection::Consume(uint16_t channelId, const std::string& queueName,
+                                            bool noAck) {
+    const std::string context = "Error performing basic consume. Channel ID: " +
+                                ChannelText(channelId) + ". Queue name: \"" + queueName + "\". ";
+    ControlGateGuard gate(Gate);
+    RequireConnection(ErrorCodes::kPerformingBasicConsume, context);
+    ReopenIfClosed(channelId);
+    amqp_basic_consume_ok_t* consumed = nullptr;
     {
-        // The broker names the consumer; its tag is not kept.
+        // The broker names the consumer.
         SocketWatchdog::Scope watch(Watchdog, Connection);
-        amqp_basic_consume(Connection, channelId, TextBytes(queueName), amqp_empty_bytes, 0,
-                           noAck ? 1 : 0, 0, amqp_empty_table);
+        consumed = amqp_basic_consume(Connection, channelId, TextBytes(queueName),
+                                      amqp_empty_bytes, 0, noAck ? 1 : 0, 0, amqp_empty_table);
     }
-    CheckChannelReply(channelId, ErrorCodes::kPerformingBasicConsume, consumeContext);
+    CheckChannelReply(channelId, ErrorCodes::kPerformingBasicConsume, context);
+    return consumed == nullptr ? std::string() : BytesText(consumed->consumer_tag);
+}
+
+void AmqpConsumerConnection::Cancel(uint16_t channelId, const std::string& consumerTag) {
+    ControlGateGuard gate(Gate);
+    if (Connection == nullptr || ConnectionLost || IsClosed(channelId) || consumerTag.empty()) {
+        return;
+    }
+    {
+        SocketWatchdog::Scope watch(Watchdog, Connection);
+        amqp_basic_cancel(Connection, channelId, TextBytes(consumerTag));
+    }
+    CheckChannelReply(channelId, ErrorCodes::kPerformingBasicConsume,
+                      "Error cancelling a consumer. Channel ID: " + ChannelText(channelId) +
+                          ". Consumer tag: \"" + consumerTag + "\". ");
 }
 
 void AmqpConsumerConnection::Unbind(uint16_t channelId, const std::string& queueName,

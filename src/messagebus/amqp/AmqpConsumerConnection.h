@@ -44,9 +44,17 @@ public:
     void DeclareQueue(uint16_t channelId, const std::string& queueName, bool durable,
                       bool exclusive, bool autoDelete);
     // Binds the queue to the exchange with BindingKey(keys), then starts a
-    // further basic.consume on it.
-    void BindAndConsume(uint16_t channelId, const std::string& queueName,
-                        const std::vector<std::string>& keys, bool noAck);
+    // further basic.consume on it; returns the broker's consumer tag.
+    std::string BindAndConsume(uint16_t channelId, const std::string& queueName,
+                               const std::vector<std::string>& keys, bool noAck);
+    // The two halves of BindAndConsume.
+    void BindQueue(uint16_t channelId, const std::string& queueName,
+                   const std::vector<std::string>& keys);
+    std::string Consume(uint16_t channelId, const std::string& queueName, bool noAck);
+    // Ends the broker's deliveries to one consumer (basic.cancel); what the
+    // queue holds stays there. Nothing on a lost connection or a closed
+    // channel, whose consumers are gone already.
+    void Cancel(uint16_t channelId, const std::string& consumerTag);
     void Unbind(uint16_t channelId, const std::string& queueName,
                 const std::vector<std::string>& keys);
     // A delivery tag of 0 does nothing, and so does a channel the broker

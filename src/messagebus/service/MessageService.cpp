@@ -84,6 +84,11 @@ template <typename Incoming>
 void MessageService::Answer(const Incoming& request, const std::optional<MessageError>& error) {
     if (!request.IgnoreResponse()) {
         GenericResponse response(request, error);
+        // Deliberate hardening: after a broker restart a service's consumer
+        // can be back before its publisher; an answer made meanwhile waits for
+        // the publisher, within the request time-out, rather than being lost.
+        // Answers are made on bus threads, never on a caller's.
+        AwaitPublisher(defaultTimeoutMs_);
         publisher_->Publish(response, false);
         return;
     }
@@ -166,6 +171,10 @@ bool MessageService::AwaitReplyRoute(uint32_t waitMs) const {
         if (subscriber_->WaitUntilBound(std::min(left, kSliceMs))) return true;
         if (left <= kSliceMs) return false;
     }
+}
+
+bool MessageService::AwaitPublisher(uint32_t waitMs) const {
+    return !IsPublisherLost() || connectionManager_->AwaitPublisher(waitMs);
 }
 
 bool MessageService::IsPublisherLost() const {

@@ -122,6 +122,10 @@ public:
     bool AwaitReplyRoute(uint32_t waitMs) const;
     // True while the publisher connection is lost.
     bool IsPublisherLost() const;
+    // Waits up to waitMs while the publisher connection is lost; true when it
+    // is connected. For a service's answers, which are made on bus threads:
+    // after a broker restart its consumer can be back before its publisher.
+    bool AwaitPublisher(uint32_t waitMs) const;
 
     // ---- Where responses go ----
     void SetDefaultResponseCallback(std::shared_ptr<Interfaces::IBroadcastCallback> callback);

@@ -83,7 +83,7 @@ int32_t RunOnConsoleReferences(uint64_t instanceId, const std::vector<uint32_t>*
         if (const int32_t status = FindClient(instanceId, client, out)) return status;
         client->SetVerbose(verbose);
         bool missing = false;
-        const auto tags = LookupInstanceTags(instanceId, *references, missing);
+        const auto tags = LookupTags(*references, missing);
         if (tags.empty()) return ReportNamedError("Tag.InvalidTagReference", out);
         std::string text;
         if (const int32_t status = operation(*client, tags, text)) return out.Report(status, text);

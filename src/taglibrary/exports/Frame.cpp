@@ -53,9 +53,8 @@ void RegisterReferencesIfAbsent(const std::vector<std::shared_ptr<TagData>>& tag
     for (const auto& tag : tags) state.TagReferenceTable.emplace(tag->Reference(), tag);
 }
 
-std::vector<std::shared_ptr<TagData>> LookupInstanceTags(uint64_t instanceId,
-                                                         const std::vector<uint32_t>& references,
-                                                         bool& missing) {
+std::vector<std::shared_ptr<TagData>> LookupTags(const std::vector<uint32_t>& references,
+                                                 bool& missing) {
     std::vector<std::shared_ptr<TagData>> tags;
     tags.reserve(references.size());
     missing = false;
@@ -63,8 +62,9 @@ std::vector<std::shared_ptr<TagData>> LookupInstanceTags(uint64_t instanceId,
     std::lock_guard<std::mutex> lock(state.TableMutex);
     for (const uint32_t reference : references) {
         const auto found = state.TagReferenceTable.find(reference);
-        // A tag of another instance is as wrong here as an unknown number.
-        if (found == state.TagReferenceTable.end() || found->second->instanceId != instanceId) {
+        // Only a number the table does not hold is left out; a tag opened on
+        // another instance goes with the others, by its path.
+        if (found == state.TagReferenceTable.end()) {
             missing = true;
             continue;
         }

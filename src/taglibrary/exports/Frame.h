@@ -75,11 +75,10 @@ void RegisterReferenceIfAbsent(const std::shared_ptr<TagData>& tag);
 // The same for several records, under one lock.
 void RegisterReferencesIfAbsent(const std::vector<std::shared_ptr<TagData>>& tags);
 void EraseReference(uint32_t tagReference);
-// The records behind the references that the table holds for the instance,
-// in order; `missing` tells whether any reference was left out.
-std::vector<std::shared_ptr<TagData>> LookupInstanceTags(uint64_t instanceId,
-                                                         const std::vector<uint32_t>& references,
-                                                         bool& missing);
+// The records behind the references that the table holds, in order, of
+// whichever instance; `missing` tells whether any reference was left out.
+std::vector<std::shared_ptr<TagData>> LookupTags(const std::vector<uint32_t>& references,
+                                                 bool& missing);
 
 // Closes one session of a tag and, when it was the last, drops its reference.
 template <typename ErrorOut>

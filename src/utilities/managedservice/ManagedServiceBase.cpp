@@ -9,6 +9,7 @@
 #include "messagebus/service/MessageServiceSettings.h"
 #include "messagebus/service/MessageSubscriberBuilder.h"
 #include "messagelibrary/audit/AuditAddRoutedMessage.h"
+#include "messagelibrary/configuration/ConfigurationGetSectionKeyValuesRequest.h"
 #include "messagelibrary/service/ServiceStatusBroadcast.h"
 #include "messagelibrary/servicemanager/SvcMgrRegisterLocalServiceRoutedMessage.h"
 #include "messagelibrary/servicemanager/SvcMgrSendServiceStatusRequestBroadcast.h"
@@ -70,15 +71,6 @@ void ManagedServiceBase::Run(const ManagedServiceOptions& options) {
         StopService();
         throw;
     }
-    if (standalone) {
-        {
-            std::lock_guard<std::mutex> lock(stateMutex);
-            started = true;
-        }
-        GoLive();
-    } else {
-        Register();
-    }
 }
 
 void ManagedServiceBase::StartBus(const ManagedServiceOptions& options) {
@@ -87,7 +79,10 @@ void ManagedServiceBase::StartBus(const ManagedServiceOptions& options) {
     settings.Name = serviceName;
     settings.ConnectionManager = options.connectionManager;
     settings.AutoStart = false;
-    messageService = std::make_shared<MessageBus::MessageService>(settings);
+    {
+        std::lock_guard<std::mutex> lock(serviceMutex);
+        messageService = std::make_shared<MessageBus::MessageService>(settings);
+    }
 
     processLogger = std::make_shared<TraceLogging::ProcessLogger>(
         serviceName, messageService->GetPublishCallback(), messageService->GetRegisterCallback());
@@ -122,7 +117,13 @@ void ManagedServiceBase::StartBus(const ManagedServiceOptions& options) {
 }
 
 std::string ManagedServiceBase::GetControlQueueName() const {
-    return messageService ? messageService->QueueName() + kControlSuffix : std::string();
+    const auto service = ServiceSnapshot();
+    return service ? service->QueueName() + kControlSuffix : std::string();
+}
+
+std::shared_ptr<MessageBus::MessageService> ManagedServiceBase::ServiceSnapshot() const {
+    std::lock_guard<std::mutex> lock(serviceMutex);
+    return messageService;
 }
 
 void ManagedServiceBase::AddWorkSubscriber(MessageBus::MessageSubscriber* subscriber) {
@@ -137,18 +138,41 @@ std::optional<ServiceState> ManagedServiceBase::State() const {
 }
 
 void ManagedServiceBase::SetState(ServiceState next) {
-    std::lock_guard<std::mutex> lock(stateMutex);
-    const StateChange change = DecideStateChange(state, next);
-    if (!change.store) return;
-    state = next;
-    if (change.broadcast) BroadcastState(next);
+    {
+        std::lock_guard<std::mutex> lock(stateMutex);
+        const StateChange change = DecideStateChange(state, next);
+        if (!change.store) return;
+        state = next;
+        if (!change.broadcast) return;
+        pendingBroadcasts.push_back(next);
+        // Another thread is sending: it sends this one too, after its own.
+        if (broadcasting) return;
+        broadcasting = true;
+    }
+    SendPendingBroadcasts();
 }
 
-// Called with stateMutex held.
+void ManagedServiceBase::SendPendingBroadcasts() {
+    for (;;) {
+        ServiceState next;
+        {
+            std::lock_guard<std::mutex> lock(stateMutex);
+            if (pendingBroadcasts.empty()) {
+                broadcasting = false;
+                return;
+            }
+            next = pendingBroadcasts.front();
+            pendingBroadcasts.pop_front();
+        }
+        BroadcastState(next);
+    }
+}
+
 void ManagedServiceBase::BroadcastState(ServiceState current) {
-    if (!messageService) return;
+    const std::string controlQueue = GetControlQueueName();
+    if (controlQueue.empty()) return;  // stopped: no bus to tell it on
     VeldraMessageLibrary::ServiceMessages::ServiceStatusBroadcast status(
-        GetNodeName(), serviceGuid, serviceName, serviceGroupName, GetControlQueueName(), current);
+        GetNodeName(), serviceGuid, serviceName, serviceGroupName, controlQueue, current);
     PublishQuietly(status);
 }
 
@@ -159,6 +183,22 @@ void ManagedServiceBase::Register() {
         GetControlQueueName(), static_cast<int32_t>(getpid()));
     PublishQuietly(message);
     SetState(ServiceState::Registered);
+    bool ask = false;
+    {
+        std::lock_guard<std::mutex> lock(stateMutex);
+        ask = !configurationReceived;
+    }
+    // Asked at each registration until an answer came: a configuration
+    // service that was not there at the first one answers a later one.
+    if (ask) RequestConfiguration();
+}
+
+void ManagedServiceBase::RequestConfiguration() {
+    VeldraMessageLibrary::ConfigurationMessages::ConfigurationGetSectionKeyValuesRequest request;
+    // The answer goes to the control queue, where the manager's messages
+    // are handled.
+    request.Headers().SetReplyTo(GetControlQueueName());
+    PublishQuietly(request);
 }
 
 // ---- Transitions ----
@@ -194,7 +234,7 @@ std::optional<MessageBus::MessageError> ManagedServiceBase::ApplyConfiguration(
 }
 
 void ManagedServiceBase::SendAudit(const std::string& text) {
-    if (!messageService) return;
+    if (!ServiceSnapshot()) return;
     VeldraMessageLibrary::AuditTrailMessages::AuditEntry entry;
     entry.timestamp = boost::posix_time::microsec_clock::universal_time();
     entry.recordType = kAuditSource;
@@ -234,8 +274,8 @@ void ManagedServiceBase::StopService() noexcept {
     if (processLogger) processLogger->Stop();
     std::shared_ptr<MessageBus::MessageService> service;
     {
-        // A state change broadcasts under this lock; it finds no service now.
-        std::lock_guard<std::mutex> lock(stateMutex);
+        // Readers take a copy under this lock; from here on they find none.
+        std::lock_guard<std::mutex> lock(serviceMutex);
         service = std::move(messageService);
     }
     service.reset();
@@ -249,9 +289,10 @@ std::shared_ptr<MessageBus::Interfaces::ITraceLogger> ManagedServiceBase::TraceL
 }
 
 bool ManagedServiceBase::PublishQuietly(MessageBus::MessageBase& message) {
-    if (!messageService) return false;
+    const auto service = ServiceSnapshot();
+    if (!service) return false;
     try {
-        messageService->Publish(message);
+        service->Publish(message);
         return true;
     } catch (const std::exception& error) {
         LogError("Cannot send " + message.MessageType() + ": " + error.what());

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <deque>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -57,10 +58,12 @@ public:
     virtual void Shutdown();
 
     // Builds the logger, the message service and the control subscriber and
-    // starts them; under a manager it then registers, standalone it goes
-    // live. Throws VeldraException (-251004, "Shutdown event cannot be
-    // null.") without a shutdown event, and whatever the bus throws when it
-    // cannot start.
+    // starts them; nothing more. The service registers when the manager's
+    // status request comes, and goes live when the manager says so; a
+    // standalone service, or one that will not wait for the manager, says so
+    // in its own code (Register, GoLive). Throws VeldraException (-251004,
+    // "Shutdown event cannot be null.") without a shutdown event, and
+    // whatever the bus throws when it cannot start.
     void Run(const ManagedServiceOptions& options);
 
     // The service's own queue followed by "_Control"; empty before Run.
@@ -84,11 +87,14 @@ protected:
     // service and the logger. A derived class calls it first in its
     // destructor; a second call does nothing. Not from a bus callback.
     void StopService() noexcept;
-    MessageBus::MessageService* Service() const { return messageService.get(); }
+    MessageBus::MessageService* Service() const { return ServiceSnapshot().get(); }
 
     // Sends an audit trail entry of the source "Service" with the text; a
     // failure is logged, not thrown.
     void SendAudit(const std::string& text);
+    // Registers with the manager of this node, as the manager's status
+    // request does, and asks for the configuration while none has come.
+    void Register();
 
     std::shared_ptr<MessageBus::MessageService> messageService;
     // The control queue's subscriber.
@@ -112,8 +118,15 @@ private:
     void OnGoLive(const MessageBus::GenericMessage& message);
     void OnMakeIdle();
     void OnShutdown();
-    void Register();
+    // Asks the configuration service for this service's configuration; the
+    // answer comes to the control queue.
+    void RequestConfiguration();
+    // Sends the state broadcasts that SetState queued, in their order, with
+    // no lock held while a message goes out.
+    void SendPendingBroadcasts();
     void BroadcastState(VeldraMessageLibrary::ServiceState state);
+    // The message service, or null once StopService took it.
+    std::shared_ptr<MessageBus::MessageService> ServiceSnapshot() const;
     // The go-live and idle log lines' head: text, process id, " - ", name.
     std::string TransitionText(const std::string& text) const;
     void StartBus(const ManagedServiceOptions& options);
@@ -127,12 +140,21 @@ private:
     std::shared_ptr<ReceiveResponseMessageCallback> responseCallback;
     std::unique_ptr<ReceiveResponseMessageCallbackWithState> responseStateCallback;
 
-    // Guards state, started and goLiveWhenReady; held while a state change is
-    // broadcast, so that broadcasts go out in the order of the changes.
+    // Guards messageService, which StopService moves out while bus threads
+    // may still read it.
+    mutable std::mutex serviceMutex;
+
+    // Guards state, started, goLiveWhenReady, configurationReceived and the
+    // broadcasts that wait to go out. Never held while a message is sent.
     mutable std::mutex stateMutex;
     std::optional<VeldraMessageLibrary::ServiceState> state;
     bool started = false;
     bool goLiveWhenReady = false;
+    bool configurationReceived = false;
+    // State broadcasts in the order of the changes, and whether a thread is
+    // sending them: that thread sends what others queue meanwhile too.
+    std::deque<VeldraMessageLibrary::ServiceState> pendingBroadcasts;
+    bool broadcasting = false;
 
     // Guards shutdownThread and stopped.
     std::mutex shutdownMutex;

@@ -89,6 +89,7 @@ void ManagedServiceBase::OnConfiguration(const MessageBus::GenericMessage& messa
     bool goLive = false;
     {
         std::lock_guard<std::mutex> lock(stateMutex);
+        configurationReceived = true;
         started = true;
         goLive = goLiveWhenReady;
     }
@@ -152,8 +153,13 @@ void ManagedServiceBase::ReceiveUnhandledMessage(std::shared_ptr<MessageBus::Gen
     if (!traceLogger) return;
     const std::string& name = message->MessageType();
     if (!message->HasError()) {
-        traceLogger->Log(traceLogger->GetTracePoint(kUnhandledPoint),
-                         name + ": Origin=" + message->Origin());
+        MessageBus::TracePoint point;
+        try {
+            point = traceLogger->GetTracePoint(kUnhandledPoint);
+        } catch (const MessageBus::VeldraException&) {
+            return;  // the logger is stopped: the service is on its way out
+        }
+        traceLogger->Log(point, name + ": Origin=" + message->Origin());
         return;
     }
     traceLogger->Error("Unhandled message " + name + ": Origin = " + message->Origin() +

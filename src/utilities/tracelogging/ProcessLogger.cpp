@@ -4,6 +4,9 @@
 #include <utility>
 
 #include "errors/AmqpException.h"
+#include "errors/ErrorCodes.h"
+#include "errors/VeldraException.h"
+#include "utilities/tracelogging/ConsoleLogger.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerRegisterTracePointRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerSnapshotBroadcast.h"
@@ -106,7 +109,7 @@ void ProcessLogger::RunLoggingThread() {
                 SendBuffers(sending);
                 return;
             }
-            wakeUps_.Acquire(kWakeIntervalMs);
+            WaitForWork();
             {
                 std::lock_guard<std::mutex> lock(mutex_);
                 if (full_.empty()) Rotate(false);
@@ -116,11 +119,36 @@ void ProcessLogger::RunLoggingThread() {
         }
     } catch (const std::exception& failure) {
         // The thread ends here; entries are no longer taken, so none pile up.
-        std::lock_guard<std::mutex> lock(mutex_);
-        failure_ = failure.what();
-        if (failure_.empty()) failure_ = "trace logging thread failed";
-        accepting_.store(false, std::memory_order_relaxed);
+        std::string text = failure.what();
+        if (text.empty()) text = "trace logging thread failed";
+        {
+            std::lock_guard<std::mutex> lock(mutex_);
+            failure_ = text;
+            accepting_.store(false, std::memory_order_relaxed);
+        }
+        // Said once, where it can still be seen: the bus is what failed.
+        try {
+            ConsoleLogger(moduleName_).Error("The trace logging thread ended: " + text);
+        } catch (...) {
+        }
     }
+}
+
+void ProcessLogger::WaitForWork() {
+    try {
+        wakeUps_.Acquire(kWakeIntervalMs);
+    } catch (const MessageBus::VeldraException& error) {
+        throw LoggingWaitFailure(error);
+    }
+}
+
+MessageBus::VeldraException LoggingWaitFailure(const MessageBus::VeldraException& error) {
+    // The semaphore names an invalid reference as an initialization error;
+    // the logging thread reports it, with the same text, as an exception.
+    if (error.Code() == ErrorCodes::kInvalidSemaphoreInitialization) {
+        return MessageBus::VeldraException(ErrorCodes::kException, error.what());
+    }
+    return error;
 }
 
 void ProcessLogger::SendBuffers(std::deque<TraceEntryBuffer>& buffers) {
@@ -145,6 +173,13 @@ void ProcessLogger::PublishQuietly(MessageBus::MessageBase& message) {
 }
 
 MessageBus::TracePoint ProcessLogger::GetTracePoint(const std::string& fullName) {
+    // After the stop the service that would learn of the point may be gone:
+    // no point is filed or handed out any more.
+    if (!accepting_.load(std::memory_order_relaxed)) {
+        throw MessageBus::VeldraException(
+            ErrorCodes::kException,
+            "The trace logger of " + moduleName_ + " is stopped: no trace point " + fullName + ".");
+    }
     MessageBus::TracePoint point;
     if (tracePoints_->TryGet(fullName, point)) return point;
     point = MessageBus::TracePoint(fullName);

@@ -8,6 +8,7 @@
 #include <mutex>
 #include <string>
 
+#include "errors/VeldraException.h"
 #include "messagebus/concurrency/Semaphore.h"
 #include "messagebus/concurrency/ThreadSafeMap.h"
 #include "messagebus/interfaces/IPublishCallback.h"
@@ -17,6 +18,10 @@
 #include "utilities/tracelogging/TracePoint.h"
 
 namespace Korvane::Veldra::VeldraUtilities::TraceLogging {
+
+// The failure of the logging thread's wait, from the semaphore's: an invalid
+// semaphore reference is -251004 there, with the semaphore's text.
+MessageBus::VeldraException LoggingWaitFailure(const MessageBus::VeldraException& error);
 
 using TraceEntryType = VeldraMessageLibrary::TraceLoggerMessages::TraceEntryType;
 using TracePointMap = MessageBus::ThreadSafeMap<std::string, MessageBus::TracePoint>;
@@ -52,6 +57,8 @@ public:
 
     // The point of that full name; a new one is filed disabled and announced
     // to the service with a TraceLoggerRegisterTracePointRoutedMessage.
+    // Throws VeldraException (-251004) once the logger is stopped or its
+    // thread has failed.
     MessageBus::TracePoint GetTracePoint(const std::string& fullName);
 
     // What a TraceLoggerSnapshotBroadcast does here: it changes no point.
@@ -63,6 +70,9 @@ public:
 
 private:
     void Rotate(bool force);
+    // The logging thread's wait of at most kWakeIntervalMs for a full buffer
+    // or a stop; its failures as LoggingWaitFailure gives them.
+    void WaitForWork();
     void RunLoggingThread();
     void SendBuffers(std::deque<TraceEntryBuffer>& buffers);
     // Publishes with no response expected; a failure of the bus loses the

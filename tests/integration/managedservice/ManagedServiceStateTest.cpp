@@ -10,6 +10,8 @@
 
 #include "managedservice/ManagedTestService.h"
 #include "messagebus/BusTestSupport.h"
+#include "support/BrokerEnvironment.h"
+#include "support/RawAmqpConnection.h"
 #include "support/TagServiceProcess.h"
 #include "support/TestServiceManager.h"
 
@@ -20,6 +22,29 @@ using VeldraMessageLibrary::ServiceState;
 using std::chrono::milliseconds;
 
 constexpr milliseconds kWait{10000};
+
+// The messages in the queue on the broker, by a passive declaration from a
+// connection of the test's own; -1 when it cannot tell.
+int64_t QueueDepth(const std::string& queue) {
+    RawAmqpConnection raw;
+    if (raw.OpenTcp(Broker().Host, Broker().AmqpPort) != 0 ||
+        !raw.Login(Broker().User, Broker().Password) || !raw.OpenChannel(1)) {
+        return -1;
+    }
+    const amqp_queue_declare_ok_t* declared = amqp_queue_declare(
+        raw.Get(), 1, amqp_cstring_bytes(queue.c_str()), 1, 0, 0, 0, amqp_empty_table);
+    return declared == nullptr ? -1 : static_cast<int64_t>(declared->message_count);
+}
+
+// Deletes a queue through a connection of the test's own.
+void DeleteQueue(const std::string& queue) {
+    RawAmqpConnection raw;
+    if (raw.OpenTcp(Broker().Host, Broker().AmqpPort) != 0 ||
+        !raw.Login(Broker().User, Broker().Password) || !raw.OpenChannel(1)) {
+        return;
+    }
+    amqp_queue_delete(raw.Get(), 1, amqp_cstring_bytes(queue.c_str()), 0, 0);
+}
 
 class ManagedServiceTest : public ::testing::Test {
 protected:
@@ -35,9 +60,18 @@ protected:
         options_.echoLogger = service_->Log();
     }
 
-    // Runs the service and waits for its registration.
+    // The work queue is durable: it would outlive the test.
+    void TearDown() override {
+        const std::string workQueue = service_ ? service_->WorkQueue() : std::string();
+        service_.reset();
+        if (!workQueue.empty()) DeleteQueue(workQueue);
+    }
+
+    // Runs the service, asks for the status as a manager does, and waits for
+    // the registration that answers it.
     void RunManaged() {
         service_->Run(options_);
+        serviceManager_->RequestStatus();
         ASSERT_TRUE(serviceManager_->AwaitRegistration(Name(), kWait));
     }
 
@@ -119,6 +153,47 @@ TEST_F(ManagedServiceTest, TheStatesOfALifeOnTheWire) {
                                                    ServiceState::Stopped}));
 }
 
+TEST_F(ManagedServiceTest, WorkWaitsInTheBrokersQueueBeforeGoingLiveAndWhileIdle) {
+    RunManaged();
+    Configure();
+    serviceManager_->SendBareMessage(service_->WorkQueue(), "WorkRoutedMessage", "early");
+    Barrier();
+    // Not delivered to the process before it goes live: the broker keeps it.
+    EXPECT_EQ(QueueDepth(service_->WorkQueue()), 1);
+    serviceManager_->SendGoLive(Control(), options_.serviceGuid);
+    EXPECT_TRUE(service_->AwaitWork("early", kWait));
+
+    serviceManager_->SendMakeIdle(Control());
+    ASSERT_TRUE(Broadcast(ServiceState::Idle));
+    serviceManager_->SendBareMessage(service_->WorkQueue(), "WorkRoutedMessage", "while-idle");
+    Barrier();
+    EXPECT_FALSE(service_->AwaitWork("while-idle", milliseconds(0)));
+    EXPECT_EQ(QueueDepth(service_->WorkQueue()), 1);
+    serviceManager_->SendGoLive(Control(), options_.serviceGuid);
+    EXPECT_TRUE(service_->AwaitWork("while-idle", kWait));
+}
+
+TEST_F(ManagedServiceTest, TheServiceAsksForItsConfigurationAtEachRegistrationUntilAnswered) {
+    // Where a configuration service would listen.
+    TestConsumer configurationService(*manager_, "Configuration");
+    auto& inbox = configurationService.callback->messages;
+    const auto isRequest = [](const std::shared_ptr<GenericMessage>& message) {
+        return message->MessageType() == "ConfigurationGetSectionKeyValuesRequest";
+    };
+    RunManaged();
+    const auto first = inbox.WaitFor(isRequest, kWait);
+    ASSERT_TRUE(first);
+    // The answer is to come to the control queue.
+    EXPECT_EQ((*first)->ReplyTo(), Control());
+
+    Barrier();  // registered again with no answer yet: asked again
+    EXPECT_TRUE(inbox.WaitForCount(isRequest, 2, kWait));
+    Configure();
+    Barrier();
+    Barrier();
+    EXPECT_EQ(inbox.CountOf(isRequest), 2u) << "asked again after the answer came";
+}
+
 TEST_F(ManagedServiceTest, AnErrorInTheConfigurationAnswerHoldsUntilStopped) {
     RunManaged();
     serviceManager_->SendConfigurationError(
@@ -197,11 +272,16 @@ TEST_F(ManagedServiceTest, WithAnEmptyOwnGuidAnyGoLiveIsTaken) {
     EXPECT_TRUE(service_->Log()->AwaitLine("INFO", " ServiceGuid=<empty>", kWait));
 }
 
-TEST_F(ManagedServiceTest, AStandaloneServiceGoesLiveAtOnceWithoutRegistering) {
+TEST_F(ManagedServiceTest, RunStartsTheBusAloneAndAStandaloneServiceGoesLiveWhenItSaysSo) {
     options_.standalone = true;
     serviceManager_->SendBareMessage(service_->WorkQueue(), "WorkRoutedMessage", "early");
     service_->Run(options_);
+    // Run neither registers nor goes live: the work waits in its queue.
+    EXPECT_EQ(service_->State(), ServiceState::Starting);
+    EXPECT_FALSE(service_->AwaitWork("early", milliseconds(0)));
+    service_->GoLive();
     ASSERT_TRUE(Broadcast(ServiceState::Live));
+    EXPECT_TRUE(service_->AwaitWork("early", kWait));
     EXPECT_TRUE(service_->Log()->AwaitLine(
         "INFO", "Go Live " + Pid() + " - " + Name() + " ServiceGuid=(Standalone)", kWait));
     EXPECT_EQ(serviceManager_->RegistrationCount(Name()), 0u);

@@ -60,6 +60,9 @@ ManagedTestService::ManagedTestService(MessageBus::Semaphore* shutdownEvent,
     MessageBus::MessageSubscriberBuilder builder(workQueue_);
     builder.AutoStart = false;
     builder.BindAll = true;
+    // Durable, so that work sent while the service is idle waits in the
+    // broker; the test deletes the queue when it ends.
+    builder.Durable = true;
     builder.ConnectionManager = &manager;
     builder.DefaultCallback = std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
         [this](const MessageBus::GenericMessage& message) {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <algorithm>
+
 #include <gtest/gtest.h>
 
 #include <chrono>
@@ -29,6 +31,21 @@ public:
             items_.push_back(std::move(item));
         }
         changed_.notify_all();
+    }
+    // How many items match, now.
+    template <typename Match>
+    std::size_t CountOf(Match match) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        return static_cast<std::size_t>(std::count_if(items_.begin(), items_.end(), match));
+    }
+    // True once `count` items match, within the timeout.
+    template <typename Match>
+    bool WaitForCount(Match match, std::size_t count, milliseconds timeout) {
+        std::unique_lock<std::mutex> lock(mutex_);
+        return changed_.wait_for(lock, timeout, [&] {
+            return static_cast<std::size_t>(std::count_if(items_.begin(), items_.end(), match)) >=
+                   count;
+        });
     }
     // The first item that matches, if one comes within the timeout.
     template <typename Match>

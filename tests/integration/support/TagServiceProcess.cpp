@@ -64,12 +64,12 @@ std::string JsonText(const std::string& text) {
 }  // namespace
 
 std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string& directory,
-                                const std::string& id) {
+                                const std::string& id, const std::string& exchange) {
     // Written by hand, as a deployment writes it, so that this support needs
     // nothing of the library and also serves tests of the shared library alone.
     const std::string text = "{\"Id\":" + JsonText(id) +
                              ",\"DisplayName\":\"private test broker\",\"ConnectionType\":\"Local\"" +
-                             ",\"ExchangeName\":\"kvveldra.amqpio.test\",\"Host\":" +
+                             ",\"ExchangeName\":" + JsonText(exchange) + ",\"Host\":" +
                              JsonText(broker.Host) + ",\"VirtualHost\":" +
                              JsonText(broker.VirtualHost) +
                              ",\"Port\":" + std::to_string(broker.AmqpPort) +

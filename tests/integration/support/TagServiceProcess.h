@@ -17,7 +17,8 @@ namespace Korvane::Veldra::Testing {
 // broker (plain AMQP on Host and AmqpPort, its user, the tests' exchange) and
 // returns <directory>. The directory is made when missing.
 std::string WriteBrokerDataRoot(const BrokerSettings& broker, const std::string& directory,
-                                const std::string& id = "veldra_master");
+                                const std::string& id = "veldra_master",
+                                const std::string& exchange = "kvveldra.amqpio.test");
 
 // The test process's own data root: made once under $TMPDIR with
 // WriteBrokerDataRoot(Broker(), ...), and VELDRA_DATA_DIR set to it before

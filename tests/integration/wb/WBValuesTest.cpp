@@ -26,9 +26,8 @@ int32_t StartVariantWrite(uint32_t reference, int32_t type, const std::vector<Wb
 
 WbVariant* TextVariant(const std::string& text) {
     WbVariant* variant = WbVariantNew();
-    WBStrHandle handle = NewHostString(text);
-    WbVariantSetLStr(variant, handle);
-    DisposeElement(handle);
+    // The variant takes the handle over.
+    WbVariantSetLStr(variant, NewHostString(text));
     return variant;
 }
 

@@ -8,6 +8,7 @@
 #include "messagelibrary/GenericMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerBroadcastTracePointsRoutedMessage.h"
 #include "messagelibrary/tracelogger/TraceLoggerSnapshotBroadcast.h"
+#include "errors/ErrorCodes.h"
 #include "utilities/tracelogging/ProcessLogger.h"
 #include "utilities/tracelogging/TraceLogger.h"
 
@@ -99,14 +100,38 @@ TEST_F(ProcessLoggerTest, ABusFailureLosesOneBatchAndTheThreadGoesOn) {
     EXPECT_EQ(logger->ThreadFailure(), "");
 }
 
-TEST_F(ProcessLoggerTest, AnyOtherFailureEndsTheThreadAndLaterEntriesAreDropped) {
+TEST_F(ProcessLoggerTest, AnyOtherFailureEndsTheThreadSaysSoOnceAndLaterEntriesAreDropped) {
+    ::testing::internal::CaptureStdout();
     bus->FailNext(1, false);
     Write("ends the thread");
     ASSERT_TRUE(bus->WaitForFailures(1, kPatience));
     logger->Stop();  // joins the ended thread
+    const std::string console = ::testing::internal::GetCapturedStdout();
     EXPECT_EQ(logger->ThreadFailure(), "not a bus failure");
+    EXPECT_NE(console.find(" | Module | ERROR - The trace logging thread ended: not a bus failure\n"),
+              std::string::npos)
+        << console;
     Write("dropped");
     EXPECT_TRUE(bus->StoredEntries().empty());
+}
+
+TEST_F(ProcessLoggerTest, AStoppedLoggerHandsOutNoTracePoint) {
+    logger->GetTracePoint("Module.Before");
+    logger->Stop();
+    EXPECT_THROW(logger->GetTracePoint("Module.After"), MessageBus::VeldraException);
+    EXPECT_THROW(logger->GetTracePoint("Module.Before"), MessageBus::VeldraException);
+    EXPECT_EQ(bus->PublishedOf("TraceLoggerRegisterTracePointRoutedMessage").size(), 1u);
+}
+
+TEST(LoggingWaitFailure, AnInvalidSemaphoreIsAnExceptionWithTheSemaphoresText) {
+    const MessageBus::VeldraException invalid(
+        ErrorCodes::kInvalidSemaphoreInitialization,
+        "Acquire with timeout failed: EINVAL -- Invalid semaphore reference.");
+    const auto reported = LoggingWaitFailure(invalid);
+    EXPECT_EQ(reported.Code(), -251004);
+    EXPECT_STREQ(reported.what(), "Acquire with timeout failed: EINVAL -- Invalid semaphore reference.");
+    const MessageBus::VeldraException unsupported(ErrorCodes::kNotSupported, "ENOSYS");
+    EXPECT_EQ(LoggingWaitFailure(unsupported).Code(), ErrorCodes::kNotSupported);
 }
 
 TEST_F(ProcessLoggerTest, PointsAreAnnouncedOnceAndSnapshotsChangeNone) {

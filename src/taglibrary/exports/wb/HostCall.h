@@ -24,19 +24,15 @@ using HostTags = std::vector<std::shared_ptr<TagData>>;
 // Runs `operation(text)` as a host function. A failure that comes with a text
 // is reported into the host's error string; a status without one (1 for a
 // missing out-pointer, the host's own status of an allocation or variant
-// call) goes back as it is, and the error string stays untouched.
+// call) goes back as it is, and the error string stays untouched. Any
+// exception, the library's own included, is unexpected here, as in the
+// console family: -251037 with its text as the insert.
 template <typename Operation>
 int32_t RunHost(WBStrHandle* error, Operation&& operation) {
     HostErrorOut out(error);
     return RunInFrame(out, [&] {
         std::string text;
-        int32_t status = 0;
-        try {
-            status = operation(text);
-        } catch (const MessageBus::VeldraException& exception) {
-            // A host that lacks a runtime function the call needs.
-            return out.Report(exception.Code(), exception.what());
-        }
+        const int32_t status = operation(text);
         return status == 0 || text.empty() ? status : out.Report(status, text);
     });
 }
@@ -71,9 +67,20 @@ bool AnyNull(const First* first, const Rest*... rest) {
     return first == nullptr || AnyNull(rest...);
 }
 
-// A request function on one tag: `start(client, tag, request, requestId,
-// timeoutMs, text)` runs with a fresh request whose signal number is already
-// in *signal.
+// Makes the request of a host function when the call is about to send: the
+// signal is allocated and its number written to *signal only then, so that a
+// call refused by its checks leaves the host no signal number at all.
+class HostRequestMaker {
+public:
+    explicit HostRequestMaker(uint32_t* signal) : signal_(signal) {}
+    HostRequest operator()() const { return MakeWBAsyncRequest(*signal_); }
+
+private:
+    uint32_t* const signal_;
+};
+
+// A request function on one tag: `start(client, tag, makeRequest,
+// requestId, timeoutMs, text)`; it calls makeRequest() once its checks pass.
 template <typename Start>
 int32_t RequestOnHostTag(uint32_t tagReference, uint32_t* requestId, uint32_t* timeoutMs,
                          uint32_t* signal, WBStrHandle* error, Start&& start) {
@@ -82,12 +89,11 @@ int32_t RequestOnHostTag(uint32_t tagReference, uint32_t* requestId, uint32_t* t
         std::shared_ptr<Client> client;
         std::shared_ptr<TagData> tag;
         if (const int32_t status = FindHostTag(tagReference, client, tag, text)) return status;
-        const HostRequest request = MakeWBAsyncRequest(*signal);
-        return start(*client, tag, request, *requestId, *timeoutMs, text);
+        return start(*client, tag, HostRequestMaker(signal), *requestId, *timeoutMs, text);
     });
 }
 
-// A request function on an instance: `start(client, request, requestId,
+// A request function on an instance: `start(client, makeRequest, requestId,
 // timeoutMs, text)`.
 template <typename Start>
 int32_t RequestOnHostInstance(uint64_t instanceId, uint32_t* requestId, uint32_t* timeoutMs,
@@ -96,16 +102,14 @@ int32_t RequestOnHostInstance(uint64_t instanceId, uint32_t* requestId, uint32_t
     return RunHost(error, [&](std::string& text) {
         std::shared_ptr<Client> client;
         if (const int32_t status = FindHostClient(instanceId, client, text)) return status;
-        const HostRequest request = MakeWBAsyncRequest(*signal);
-        return start(*client, request, *requestId, *timeoutMs, text);
+        return start(*client, HostRequestMaker(signal), *requestId, *timeoutMs, text);
     });
 }
 
-// The references of a host array that the table holds for the instance, in
-// order; `missing` tells whether any was left out. A null array is empty.
-inline HostTags ResolveHostReferences(uint64_t instanceId, WBReferenceArrayHandle references,
-                                      bool& missing) {
-    return LookupInstanceTags(instanceId, ReadHostReferences(references), missing);
+// The references of a host array that the table holds, in order; `missing`
+// tells whether any was left out. A null array is empty.
+inline HostTags ResolveHostReferences(WBReferenceArrayHandle references, bool& missing) {
+    return LookupTags(ReadHostReferences(references), missing);
 }
 
 // A request function on a batch of references: `start(client, tags, request,
@@ -119,11 +123,12 @@ int32_t RequestOnHostReferences(uint64_t instanceId, WBReferenceArrayHandle refe
                                 uint32_t* signal, WBStrHandle* error, Start&& start) {
     return RequestOnHostInstance(
         instanceId, requestId, timeoutMs, signal, error,
-        [&](Client& client, const HostRequest& request, uint32_t& id, uint32_t& timeout,
+        [&](Client& client, const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
             std::string& text) {
             bool missing = false;
-            const HostTags tags = ResolveHostReferences(instanceId, references, missing);
+            const HostTags tags = ResolveHostReferences(references, missing);
             if (tags.empty()) return HostError("Tag.InvalidTagReference", text);
+            const HostRequest request = makeRequest();
             HostRequest filed = request;
             if (anyInvalid != nullptr) {
                 *anyInvalid = missing;

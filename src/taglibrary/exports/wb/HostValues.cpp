@@ -7,6 +7,7 @@
 #include "taglibrary/exports/Frame.h"
 #include "taglibrary/exports/wb/HostArrays.h"
 #include "taglibrary/exports/wb/HostRuntime.h"
+#include "taglibrary/exports/wb/HostStrings.h"
 
 namespace Korvane::Veldra::TagLibrary {
 namespace {
@@ -15,15 +16,12 @@ int32_t NamedError(const char* name, std::string& text) {
     return FormatNamedError(name, {}, text);
 }
 
-// Stores `value` in the variant through a string handle that lives in this
-// frame: the host copies what it is given.
+// Stores `value` in the variant through a string handle of the host's own
+// memory manager: the host takes the handle over and may free or resize it.
 int32_t SetVariantText(const HostRuntime& host, WbVariant* variant, const std::string& value) {
-    std::vector<unsigned char> block(offsetof(WBStr, str) + value.size() + 1);
-    auto* string = reinterpret_cast<WBStr*>(block.data());
-    string->cnt = static_cast<int32_t>(value.size());
-    std::copy(value.begin(), value.end(), string->str);
-    WBStr* pointer = string;
-    return host.VariantSetLStr(variant, &pointer);
+    WBStrHandle handle = nullptr;
+    if (const int32_t status = CopyToHostString(&handle, value)) return status;
+    return host.VariantSetLStr(variant, handle);
 }
 
 }  // namespace
@@ -36,7 +34,12 @@ int32_t VariantToValueText(WbVariant* variant, std::optional<TagDataType> type, 
                   *type != TagDataType::Boolean && *type != TagDataType::String))
         return NamedError("Tag.InvalidTagDataType", text);
     const void* data = variant == nullptr ? nullptr : host.VariantGetDataPtr(variant);
-    if (data == nullptr) return NamedError("Tag.InvalidTagValue", text);
+    if (data == nullptr) {
+        // An empty element: the text of a value never set, which reads as an
+        // empty string, NaN, 0 or false.
+        value.clear();
+        return 0;
+    }
     switch (*type) {
         case TagDataType::Double:
             value = FormatDouble(*static_cast<const double*>(data));

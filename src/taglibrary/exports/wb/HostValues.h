@@ -18,7 +18,8 @@ using VeldraMessageLibrary::TagAggregates;
 // The value text of a variant for a tag of `type`: Double through
 // FormatDouble, Int in decimal, Boolean "True" or "False", String the text of
 // its handle. UInt64 and DateTime go only as text: they, and an unknown type,
-// give "Tag.InvalidTagDataType". Returns 0 or a status with `text` filled.
+// give "Tag.InvalidTagDataType". An element with no data gives the empty text.
+// Returns 0 or a status with `text` filled.
 int32_t VariantToValueText(WbVariant* variant, std::optional<TagDataType> type, std::string& value,
                            std::string& text);
 

@@ -37,13 +37,13 @@ int32_t TagWBList2(uint64_t instanceId, WBStrArrayHandle searchPaths,
                    WBStrHandle* error) {
     return RequestOnHostInstance(
         instanceId, requestId, timeoutMs, signal, error,
-        [&](Client& client, const HostRequest& request, uint32_t& id, uint32_t& timeout,
+        [&](Client& client, const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
             std::string& text) {
             std::vector<std::string> paths = ReadHostStrings(searchPaths);
             if (paths.empty()) paths.push_back("*");
             // The host always takes what the service has, stale or not.
             return client.ListTags(paths, ReadHostProperties(properties),
-                                   ReadHostStrings(keywords), skip, take, true, request, id,
+                                   ReadHostStrings(keywords), skip, take, true, makeRequest(), id,
                                    timeout, text);
         });
 }

@@ -19,9 +19,10 @@ int32_t GetOnHostTag(uint32_t tagReference, uint32_t* requestId, uint32_t* timeo
                      uint32_t* signal, WBStrHandle* error, GetStart start) {
     return RequestOnHostTag(
         tagReference, requestId, timeoutMs, signal, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, const HostRequest& request,
-            uint32_t& id, uint32_t& timeout, std::string& text) {
-            return (client.*start)(tag, request, id, timeout, text);
+        [&](Client& client, const std::shared_ptr<TagData>& tag,
+            const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
+            std::string& text) {
+            return (client.*start)(tag, makeRequest(), id, timeout, text);
         });
 }
 
@@ -40,10 +41,11 @@ int32_t SetOnHostTag(uint32_t tagReference, uint64_t* instanceId, uint32_t* requ
     if (instanceId == nullptr) return 1;
     return RequestOnHostTag(
         tagReference, requestId, timeoutMs, signal, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, const HostRequest& request,
-            uint32_t& id, uint32_t& timeout, std::string& text) {
+        [&](Client& client, const std::shared_ptr<TagData>& tag,
+            const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
+            std::string& text) {
             *instanceId = tag->instanceId;
-            return start(client, tag, request, id, timeout, text);
+            return start(client, tag, makeRequest(), id, timeout, text);
         });
 }
 

@@ -10,9 +10,9 @@ int32_t TagWBLookupTag(uint64_t instanceId, WBStrHandle* path, uint32_t* request
                        uint32_t* timeoutMs, uint32_t* signal, WBStrHandle* error) {
     return RequestOnHostInstance(
         instanceId, requestId, timeoutMs, signal, error,
-        [&](Client& client, const HostRequest& request, uint32_t& id, uint32_t& timeout,
+        [&](Client& client, const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
             std::string& text) {
-            return client.OpenTag(ReadHostString(path), request, id, timeout, text);
+            return client.OpenTag(ReadHostString(path), makeRequest(), id, timeout, text);
         });
 }
 

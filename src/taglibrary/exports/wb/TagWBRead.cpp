@@ -60,9 +60,10 @@ int32_t TagWBRead(uint32_t tagReference, uint32_t* requestId, uint32_t* timeoutM
                   uint32_t* signal, WBStrHandle* error) {
     return RequestOnHostTag(
         tagReference, requestId, timeoutMs, signal, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, const HostRequest& request,
-            uint32_t& id, uint32_t& timeout, std::string& text) {
-            return client.ReadValues({tag}, true, request, id, timeout, text);
+        [&](Client& client, const std::shared_ptr<TagData>& tag,
+            const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
+            std::string& text) {
+            return client.ReadValues({tag}, true, makeRequest(), id, timeout, text);
         });
 }
 

@@ -21,11 +21,13 @@ int32_t WriteOnHostTag(uint32_t tagReference, int32_t dataType, std::size_t coun
                        ValueAt&& valueAt) {
     return RequestOnHostTag(
         tagReference, requestId, timeoutMs, signal, error,
-        [&](Client& client, const std::shared_ptr<TagData>& tag, const HostRequest& request,
-            uint32_t& id, uint32_t& timeout, std::string& text) {
+        [&](Client& client, const std::shared_ptr<TagData>& tag,
+            const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
+            std::string& text) {
+            // The client's types are compared: unset, None and a number out
+            // of range are three different things there.
             const auto type = ExportedToType(dataType);
-            if (TypeToExported(type) != client.ExportedType(*tag))
-                return HostError("Tag.InvalidTagDataType", text);
+            if (type != client.DataTypeOf(*tag)) return HostError("Tag.InvalidTagDataType", text);
             std::vector<TagValueSample> samples;
             samples.reserve(count);
             for (std::size_t i = 0; i < count; ++i) {
@@ -34,7 +36,7 @@ int32_t WriteOnHostTag(uint32_t tagReference, int32_t dataType, std::size_t coun
                 samples.push_back(
                     TagValueSample{HostTimestampAt(timestamps, i), TagValue{type, std::move(value)}});
             }
-            return client.WriteValues(tag, samples, request, id, timeout, text);
+            return client.WriteValues(tag, samples, makeRequest(), id, timeout, text);
         });
 }
 
@@ -46,7 +48,7 @@ int32_t WriteOnHostInstance(uint64_t instanceId, Array** values, uint32_t* reque
                             ValueOf&& valueOf) {
     return RequestOnHostInstance(
         instanceId, requestId, timeoutMs, signal, error,
-        [&](Client& client, const HostRequest& request, uint32_t& id, uint32_t& timeout,
+        [&](Client& client, const HostRequestMaker& makeRequest, uint32_t& id, uint32_t& timeout,
             std::string& text) {
             const std::size_t count = HostArrayCount(values);
             std::vector<std::string> paths;
@@ -62,7 +64,7 @@ int32_t WriteOnHostInstance(uint64_t instanceId, Array** values, uint32_t* reque
                 samples.push_back(TagValueSample{HostTimestampOrNone(element.timestamp),
                                                  TagValue{type, std::move(value)}});
             }
-            return client.WriteMulti(paths, samples, request, id, timeout, text);
+            return client.WriteMulti(paths, samples, makeRequest(), id, timeout, text);
         });
 }
 
