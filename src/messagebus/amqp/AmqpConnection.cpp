@@ -443,9 +443,13 @@ void AmqpConnection::DeclareExchange(uint16_t channelId) {
     DeclareExchangeOn(Connection, channelId);
 }
 
-void AmqpConnection::DeclareExchangeOn(amqp_connection_state_t state, uint16_t channelId) {
+void AmqpConnection::SendExchangeDeclare(amqp_connection_state_t state, uint16_t channelId) const {
     amqp_exchange_declare(state, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
                           amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
+}
+
+void AmqpConnection::DeclareExchangeOn(amqp_connection_state_t state, uint16_t channelId) {
+    SendExchangeDeclare(state, channelId);
     CheckReply(amqp_get_rpc_reply(state), ErrorCodes::kDeclaringExchange,
                DeclareExchangeContext(channelId));
 }

@@ -116,6 +116,9 @@ protected:
     // the socket, before the watchdog would cut it.
     std::chrono::steady_clock::duration StallLimit() const;
 
+    // Sends the declaration of the topic exchange ExchangeName on the
+    // channel; the caller reads the reply.
+    void SendExchangeDeclare(amqp_connection_state_t state, uint16_t channelId) const;
     // The start of the text of a failed exchange declaration.
     std::string DeclareExchangeContext(uint16_t channelId) const;
 

@@ -126,8 +126,7 @@ bool AmqpPublisherConnection::RestoreClosedChannel(uint16_t channelId) {
         " that the broker had closed; declaring the exchange again.");
     {
         SocketWatchdog::Scope watch(Watchdog, Connection);
-        amqp_exchange_declare(Connection, channelId, amqp_cstring_bytes(ExchangeName.c_str()),
-                              amqp_cstring_bytes("topic"), 0, 1, 0, 0, amqp_empty_table);
+        SendExchangeDeclare(Connection, channelId);
     }
     CheckChannelReply(channelId, ErrorCodes::kDeclaringExchange,
                       DeclareExchangeContext(channelId));
