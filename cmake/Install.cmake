@@ -12,7 +12,9 @@ install(EXPORT kvveldra_tagTargets NAMESPACE kvveldra::
 
 # The public headers need the C++ standard library alone, and the shared
 # library links everything else privately: the package config finds no
-# dependencies.
+# dependencies. It uses none of the PACKAGE_ paths either, only the targets
+# file beside it, so that the same file serves the build tree
+# (cmake/BuildTreePackage.cmake).
 configure_package_config_file(${PROJECT_SOURCE_DIR}/cmake/kvveldra_tagConfig.cmake.in
   ${PROJECT_BINARY_DIR}/kvveldra_tagConfig.cmake
   INSTALL_DESTINATION ${CMAKE_INSTALL_LIBDIR}/cmake/kvveldra_tag)
@@ -50,3 +52,6 @@ if(KVVELDRA_GUIDE_FILES)
   install(FILES ${KVVELDRA_GUIDE_FILES}
     DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/doc/libkvveldra-tag-dev COMPONENT dev)
 endif()
+
+include(${CMAKE_CURRENT_LIST_DIR}/ManPages.cmake)
+include(${CMAKE_CURRENT_LIST_DIR}/BuildTreePackage.cmake)

@@ -13,10 +13,16 @@
 # component "demo" and is left out: it runs only against a broker and a service
 # set up as scripts/demo.sh does, and its source is the part worth reading.
 #
-# The packages take the install directories of the build: configured with
-# -DCMAKE_INSTALL_PREFIX=/usr, GNUInstallDirs chooses Debian's multiarch library
-# directory (usr/lib/<triplet>); with the default prefix it is usr/lib. Both
-# work, as the CMake package and the pkg-config file locate themselves.
+# The packages take the install directories of the build, Debian's (usr/bin,
+# usr/include, usr/lib/<triplet>: see cmake/InstallDirs.cmake), and each holds
+# the files Debian wants in every package: copyright, changelog and lintian
+# overrides (cmake/DebianFiles.cmake). The package test runs lintian on them.
+
+if(KVVELDRA_MULTIARCH_LIBDIR AND NOT CMAKE_INSTALL_LIBDIR STREQUAL KVVELDRA_MULTIARCH_LIBDIR)
+  message(WARNING "The Debian packages of this tree hold the libraries in usr/${CMAKE_INSTALL_LIBDIR}, "
+    "not in Debian's usr/${KVVELDRA_MULTIARCH_LIBDIR}: reconfigure with -U CMAKE_INSTALL_LIBDIR "
+    "for the default.")
+endif()
 
 set(KVVELDRA_PACKAGE_MAINTAINER "kvveldra_tag maintainers <kvveldra-tag@example.org>"
   CACHE STRING "Maintainer field of the Debian packages")
@@ -59,6 +65,16 @@ set(CPACK_DEBIAN_RUNTIME_PACKAGE_SECTION libs)
 # package has any), so that packages built against them depend on it.
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)
 set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS_POLICY ">=")
+# Debian runs ldconfig through its trigger, which the runtime package activates
+# (packaging/triggers); maintainer scripts that call ldconfig themselves are
+# out of date. CPack writes such a postinst and postrm for a package of shared
+# libraries unless the package brings its own: the two names below, which no
+# file has, stand for them. cpack warns that they are missing, and puts in the
+# package only the control files that exist.
+set(CPACK_DEBIAN_RUNTIME_PACKAGE_CONTROL_EXTRA
+  ${PROJECT_SOURCE_DIR}/packaging/triggers
+  ${PROJECT_BINARY_DIR}/no-maintainer-scripts/postinst
+  ${PROJECT_BINARY_DIR}/no-maintainer-scripts/postrm)
 set(CPACK_DEBIAN_RUNTIME_DESCRIPTION
   "Client library for a tag service over an AMQP message bus
 Named, typed current values with keywords, properties and aggregates, kept by
@@ -85,4 +101,5 @@ Command-line tools for the tag library and kvveldra-tagservice, a reference tag
 service that keeps tags in memory or in an SQLite file and answers on the
 message bus.")
 
+include(${CMAKE_CURRENT_LIST_DIR}/DebianFiles.cmake)
 include(CPack)

@@ -9,7 +9,9 @@ cd "$(dirname "$0")/.."
 scripts/install-deps.sh --with-broker
 
 build="${BUILD_DIR:-build}"
-cmake -S . -B "$build" -G Ninja -DKVVELDRA_TESTS=OFF -DKVVELDRA_BENCH=OFF
+# The tree's options stay as they are (scripts/test.sh shares it); only the
+# two programs are built.
+cmake -S . -B "$build" -G Ninja
 cmake --build "$build" -j"$(nproc)" --target kvveldra-demo kvveldra-tagservice
 
 work=$(mktemp -d "${TMPDIR:-/tmp}/kvveldra-demo.XXXXXX")

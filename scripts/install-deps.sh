@@ -11,8 +11,8 @@ packages=(
   clang libclang-rt-14-dev
   rapidjson-dev
   libsqlite3-dev
-  # cpack -G DEB: dpkg-shlibdeps, file, readelf
-  dpkg-dev file binutils
+  # cpack -G DEB: dpkg-shlibdeps, file, readelf; the package test: lintian
+  dpkg-dev file binutils lintian
 )
 if [ "${1:-}" = "--with-broker" ]; then
   packages+=(rabbitmq-server)

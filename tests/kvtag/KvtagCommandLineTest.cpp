@@ -98,7 +98,7 @@ TEST(KvtagCommandLine, RefusesWhatCannotRunAndPointsAtTheRightHelp) {
     EXPECT_EQ(Refusal({"read", "a", "--bogus"}).first, "unknown option --bogus");
     EXPECT_EQ(Refusal({"read"}).second, "read");
     EXPECT_EQ(Refusal({"create", "a.b"}).first, "create needs --type");
-    EXPECT_EQ(Refusal({"create", "a.b", "--type", "float"}).second, "create");
+    EXPECT_EQ(Refusal({"create", "a.b", "--type", "int64"}).second, "create");
     EXPECT_EQ(Refusal({"write", "a.b"}).second, "write");
     EXPECT_EQ(Refusal({"write", "a.b", "1", "--time", "2026-03-01 08:30:00"}).second, "write");
     EXPECT_EQ(Refusal({"write", "--stdin", "a.b", "1"}).first,
@@ -121,8 +121,18 @@ TEST(KvtagCommandLine, NumbersAreWholeAndInRange) {
     for (const char* bad : {"-1", "4294967296", "1e3", "", " 7", "12345678901"}) {
         EXPECT_EQ(Refusal({"list", "*", "--skip", bad}).second, "list") << bad;
     }
-    EXPECT_EQ(Refusal({"read", "a", "--timeout", "0"}).first,
-              "--timeout needs at least 1 millisecond");
+    // 0 is the library's single connect attempt.
+    EXPECT_EQ(Parse({"read", "a", "--timeout", "0"}).global.timeoutMs, 0u);
+    EXPECT_EQ(Refusal({"read", "a", "--timeout", "-1"}).first,
+              "--timeout needs a whole number from 0 to 4294967295, not '-1'");
+}
+
+TEST(KvtagCommandLine, RefusalsSayWhatIsMissing) {
+    EXPECT_EQ(Refusal({"write", "a.b", "1", "--time", "2026-03-01T08:30:00"}).first,
+              "--time '2026-03-01T08:30:00' has no zone: add Z (UTC) or an offset such as +01:00");
+    EXPECT_EQ(Refusal({"read", ""}).first, "a tag path may not be empty");
+    EXPECT_EQ(Refusal({"keywords", "a.b", "--set", "k", ""}).first, "a keyword may not be empty");
+    EXPECT_EQ(Parse({"create", "a.b", "--type", "Float"}).type, 0);
 }
 
 TEST(KvtagCommandLine, JsonIsWantedBeforeTheEndOfOptionsOnly) {

@@ -3,7 +3,9 @@
 #include <limits>
 
 #include "JsonWriter.h"
+#include "LibraryText.h"
 #include "Report.h"
+#include "TextEscape.h"
 #include "TimeText.h"
 
 namespace kvtag {
@@ -70,6 +72,47 @@ TEST(KvtagReport, PropertiesSortedAndEnvelopes) {
     EXPECT_EQ(JsonFailure("kvtag", "usage", nullptr, "y"),
               "{\"ok\":false,\"command\":\"kvtag\",\"error\":{\"kind\":\"usage\","
               "\"status\":null,\"message\":\"y\"}}");
+}
+
+TEST(KvtagReport, TextOutputKeepsEachRecordOnOneLine) {
+    EXPECT_EQ(EscapeText("a\tb\nc\rd\\e\x01\x7f\xc3\xa9"), "a\\tb\\nc\\rd\\\\e\\x01\\x7f\xc3\xa9");
+    ListReport list;
+    list.tags = {{"line\nbreak", 0}};
+    EXPECT_EQ(RenderList(list).text, "line\\nbreak\tdouble\n");
+    TagConsoleValue value;
+    value.path = "p";
+    value.dataType = 2;
+    value.value = "x\ty";
+    value.timestamp = TagConsoleTime::min();
+    EXPECT_EQ(RenderValues({value}).text, "p\tstring\tx\\ty\t-\n");
+    EXPECT_EQ(RenderProperties("p", {{"k\n", "v\\"}}).text, "k\\n=v\\\\\n");
+}
+
+TEST(KvtagReport, AggregatesWithoutSamplesShowNothingForTheirValues) {
+    AggregatesReport report;
+    report.path = "p";
+    report.type = 0;
+    const Rendered out = RenderAggregates(report);
+    EXPECT_EQ(out.text, "p\tdouble\tcollect off\tcount 0, average -, minimum -, maximum -\n");
+    EXPECT_EQ(out.json,
+              "{\"path\":\"p\",\"type\":\"double\",\"collect\":false,\"aggregates\":{"
+              "\"count\":0,\"average\":null,\"minimum\":null,\"maximum\":null}}");
+}
+
+TEST(KvtagReport, RefusalsThatLostTheirInsertsAreFilled) {
+    const std::string lost =
+        "Too few inserts passed to format the message: \"Tag '{0}' has type string and "
+        "cannot collect aggregates.\"";
+    EXPECT_EQ(FilledLibraryText(lost, {"plant.name"}),
+              "Tag 'plant.name' has type string and cannot collect aggregates.");
+    // An insert kvtag does not know leaves the library's text as it is.
+    const std::string two = "Too few inserts passed to format the message: \"'{0}': '{1}'\"";
+    EXPECT_EQ(FilledLibraryText(two, {"a"}), two);
+    EXPECT_EQ(FilledLibraryText(two, {"a", "b", "surplus"}), "'a': 'b'");
+    EXPECT_EQ(
+        FilledLibraryText("Too few inserts passed to format the message: \"{x} {} {0}\"", {"p"}),
+        "{x} {} p");
+    EXPECT_EQ(FilledLibraryText("Request timed out.", {"p"}), "Request timed out.");
 }
 
 TEST(KvtagReport, ListAndWritesNameTypes) {

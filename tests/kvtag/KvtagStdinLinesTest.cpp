@@ -78,6 +78,9 @@ TEST(KvtagStdinLines, ABadLineIsNamedByItsNumber) {
     EXPECT_EQ(Refusal("\"\" 1\n").first, 1u);
     const auto [line, message] = Refusal("a.b 1\nc.d\n");
     EXPECT_EQ(message, "line 2: a line is PATH VALUE [TIME], found 1 word(s)");
+    EXPECT_EQ(Refusal("a.b 1 2026-03-01T08:00:00\n").second,
+              "line 1: the time '2026-03-01T08:00:00' has no zone: add Z (UTC) or an offset "
+              "such as +01:00");
 }
 
 TEST(KvtagStdinLines, NothingToWriteIsAnError) {

@@ -13,8 +13,12 @@ TEST(KvtagTypes, NamesMatchTheInterfaceCodes) {
         EXPECT_EQ(ParseTypeName(names[code]), code);
         EXPECT_EQ(TypeName(code), names[code]);
     }
-    EXPECT_FALSE(ParseTypeName("Double"));
-    EXPECT_FALSE(ParseTypeName("int"));
+    // The names people type, in any case.
+    const std::pair<const char*, int32_t> others[] = {
+        {"Double", 0},  {"float", 0}, {"int", 1},      {"INTEGER", 1}, {"text", 2},
+        {"Boolean", 3}, {"uint", 4},  {"DateTime", 5}, {"time", 5},    {"timestamp", 5}};
+    for (const auto& [name, code] : others) EXPECT_EQ(ParseTypeName(name), code) << name;
+    EXPECT_FALSE(ParseTypeName("int64"));
     EXPECT_FALSE(ParseTypeName(""));
     EXPECT_EQ(TypeName(-1), "none");
     EXPECT_EQ(TypeName(6), "none");
@@ -37,9 +41,12 @@ TEST(KvtagValues, DoublesAreWholeDecimalTexts) {
     for (const char* good : {"12.5", "-0.25", "1e-3", "7", "nan", "inf", "-inf"}) {
         EXPECT_EQ(NormalizeValue(0, good), good);
     }
-    for (const char* bad : {"", "abc", "1.5x", " 1", "0x10", "1,5"}) {
+    for (const char* bad : {"", "abc", "1.5x", " 1", "0x10", "1,5", "1e400", "-1e400"}) {
         EXPECT_FALSE(NormalizeValue(0, bad)) << bad;
     }
+    EXPECT_EQ(ValueRefusal(0, "1e400"),
+              "'1e400' is not a value of type double: it is beyond the range of a double");
+    EXPECT_EQ(ValueRefusal(0, "abc"), "'abc' is not a value of type double");
 }
 
 TEST(KvtagValues, BooleansGoOutInOneSpelling) {
@@ -54,6 +61,9 @@ TEST(KvtagValues, BooleansGoOutInOneSpelling) {
 TEST(KvtagValues, DateTimesAndStrings) {
     EXPECT_EQ(NormalizeValue(5, "2026-03-01T09:30:00.5+01:00"), "2026-03-01T08:30:00.500000Z");
     EXPECT_FALSE(NormalizeValue(5, "2026-03-01"));
+    EXPECT_EQ(ValueRefusal(5, "2026-03-01T08:30:00"),
+              "'2026-03-01T08:30:00' is not a value of type datetime: it has no zone; add Z "
+              "(UTC) or an offset such as +01:00");
     EXPECT_EQ(NormalizeValue(2, ""), "");
     EXPECT_EQ(NormalizeValue(2, "Ana \"night shift\"\n"), "Ana \"night shift\"\n");
     EXPECT_FALSE(NormalizeValue(2, std::string("a\0b", 3)));

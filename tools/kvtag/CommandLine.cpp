@@ -114,9 +114,7 @@ void Apply(Invocation& call, const RawOption& option, bool& help) {
         call.global.config = value;
     } else if (name == "timeout") {
         once(call.global.timeoutMs.has_value());
-        const uint32_t ms = ParseCount(name, value, command);
-        if (ms == 0) throw UsageError("--timeout needs at least 1 millisecond", command);
-        call.global.timeoutMs = ms;
+        call.global.timeoutMs = ParseCount(name, value, command);
     } else if (name == "skip") {
         call.skip = ParseCount(name, value, command);
     } else if (name == "take") {
@@ -136,6 +134,9 @@ void Apply(Invocation& call, const RawOption& option, bool& help) {
     } else if (name == "time") {
         once(call.time.has_value());
         call.time = ParseIsoTime(value);
+        if (!call.time && LacksOnlyAZone(value)) {
+            throw UsageError("--time '" + value + "' has no zone: " + kAddAZone, command);
+        }
         if (!call.time) {
             throw UsageError(
                 "--time needs an ISO 8601 time with a zone, such as "
@@ -219,7 +220,7 @@ void ApplyWords(Invocation& call, const std::vector<std::string>& words) {
                 if (command == Command::Properties) {
                     call.properties.push_back(ParseProperty(words[i], command));
                 } else if (words[i].empty()) {
-                    throw UsageError("a keyword is not empty", command);
+                    throw UsageError("a keyword may not be empty", command);
                 } else {
                     call.keywords.push_back(words[i]);
                 }
@@ -250,9 +251,9 @@ const char* CommandName(Command command) {
 }
 
 std::optional<std::string> TagPathProblem(const std::string& path) {
-    if (path.empty()) return std::string("a tag path is not empty");
+    if (path.empty()) return std::string("a tag path may not be empty");
     if (path.find('*') != std::string::npos) {
-        return "a tag path holds no '*' (use list for patterns): '" + path + "'";
+        return "a tag path may not hold '*' (use list for patterns): '" + path + "'";
     }
     return std::nullopt;
 }

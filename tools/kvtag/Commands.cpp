@@ -45,6 +45,12 @@ std::vector<FoundTag> RequireTags(const ConsoleInstance& instance,
     return tags;
 }
 
+// The insert a refusal of the tags may lack: the path, when there is one tag.
+std::vector<std::string> OnePath(const std::vector<FoundTag>& tags) {
+    if (tags.size() != 1) return {};
+    return {tags.front().path};
+}
+
 std::vector<uint32_t> References(const std::vector<FoundTag>& tags) {
     std::vector<uint32_t> references;
     for (const auto& tag : tags) references.push_back(tag.reference);
@@ -70,10 +76,7 @@ std::optional<FoundTag> WriteTarget(const ConsoleInstance& instance, const std::
 std::string NormalizeOrThrow(int32_t type, const std::string& value, const std::string& where,
                              Command command) {
     auto text = NormalizeValue(type, value);
-    if (!text) {
-        throw UsageError(where + Quoted(value) + " is not a value of type " + TypeName(type),
-                         command);
-    }
+    if (!text) throw UsageError(where + ValueRefusal(type, value), command);
     return *text;
 }
 
@@ -84,9 +87,9 @@ Rendered Write(const Invocation& call, const ConsoleInstance& instance, OpenedTa
     const std::string value = NormalizeOrThrow(type, call.value, "", call.command);
     if (!target) target = CreateTag(instance, path, type, opened);
     const TagConsoleSamples samples{{value, call.time.value_or(NowTime())}};
-    std::string error;
-    Check("write " + path,
-          TagConsoleWriteTag(target->reference, type, &samples, instance.Verbose(), &error), error);
+    instance.Request("write " + path, {path}, [&](std::string& error) {
+        return TagConsoleWriteTag(target->reference, type, &samples, instance.Verbose(), &error);
+    });
     return RenderWrites({{path, type, 1}});
 }
 
@@ -113,15 +116,13 @@ Rendered WriteBatches(const Invocation& call, const ConsoleInstance& instance,
     std::vector<WriteEntry> written;
     for (std::size_t i = 0; i < batches.size(); ++i) {
         const FoundTag& tag = *targets[i];
-        std::string error;
-        const int32_t status =
-            TagConsoleWriteTag(tag.reference, tag.type, &samples[i], instance.Verbose(), &error);
-        if (status != 0) {
-            throw LibraryError("write " + tag.path + " (" + std::to_string(written.size()) +
-                                   " of " + std::to_string(batches.size()) +
-                                   " tags written before)",
-                               status, error);
-        }
+        const std::string operation = "write " + tag.path + " (" + std::to_string(written.size()) +
+                                      " of " + std::to_string(batches.size()) +
+                                      " tags written before)";
+        instance.Request(operation, {tag.path}, [&](std::string& error) {
+            return TagConsoleWriteTag(tag.reference, tag.type, &samples[i], instance.Verbose(),
+                                      &error);
+        });
         written.push_back({tag.path, tag.type, samples[i].size()});
     }
     return RenderWrites(written);
@@ -175,65 +176,65 @@ std::vector<TagConsoleValue> ReadValues(const ConsoleInstance& instance,
                                         const std::vector<FoundTag>& tags) {
     const auto references = References(tags);
     std::vector<TagConsoleValue> values;
-    std::string error;
-    Check("read",
-          TagConsoleReadValues(instance.Id(), &references, instance.Verbose(), 0, &values, &error),
-          error);
+    instance.Request("read", OnePath(tags), [&](std::string& error) {
+        return TagConsoleReadValues(instance.Id(), &references, instance.Verbose(), 0, &values,
+                                    &error);
+    });
     return InRequestOrder(tags, std::move(values));
 }
 
 Rendered Keywords(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
     const FoundTag tag = RequireTag(instance, call.paths.front(), opened);
-    std::string error;
     if (call.set) {
-        Check("set keywords of " + tag.path,
-              TagConsoleSetKeywords(tag.reference, &call.keywords, instance.Verbose(), &error),
-              error);
+        instance.Request("set keywords of " + tag.path, {tag.path}, [&](std::string& error) {
+            return TagConsoleSetKeywords(tag.reference, &call.keywords, instance.Verbose(), &error);
+        });
     }
     std::vector<std::string> keywords;
-    Check("get keywords of " + tag.path,
-          TagConsoleGetKeywords(tag.reference, instance.Verbose(), &keywords, &error), error);
+    instance.Request("get keywords of " + tag.path, {tag.path}, [&](std::string& error) {
+        return TagConsoleGetKeywords(tag.reference, instance.Verbose(), &keywords, &error);
+    });
     return RenderKeywords(tag.path, keywords);
 }
 
 Rendered Properties(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
     const FoundTag tag = RequireTag(instance, call.paths.front(), opened);
-    std::string error;
     if (call.set) {
         TagConsoleProperties properties;
         for (const auto& [key, value] : call.properties) properties[key] = value;
-        Check("set properties of " + tag.path,
-              TagConsoleSetProperties(tag.reference, &properties, instance.Verbose(), &error),
-              error);
+        instance.Request("set properties of " + tag.path, {tag.path}, [&](std::string& error) {
+            return TagConsoleSetProperties(tag.reference, &properties, instance.Verbose(), &error);
+        });
     }
     TagConsoleProperties properties;
-    Check("get properties of " + tag.path,
-          TagConsoleGetProperties(tag.reference, instance.Verbose(), &properties, &error), error);
+    instance.Request("get properties of " + tag.path, {tag.path}, [&](std::string& error) {
+        return TagConsoleGetProperties(tag.reference, instance.Verbose(), &properties, &error);
+    });
     return RenderProperties(tag.path, {properties.begin(), properties.end()});
 }
 
 Rendered Aggregates(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
     const FoundTag tag = RequireTag(instance, call.paths.front(), opened);
-    std::string error;
     if (call.collect) {
-        Check("switch aggregates of " + tag.path,
-              TagConsoleSetCollectAggregates(tag.reference, *call.collect, instance.Verbose(),
-                                             &error),
-              error);
+        instance.Request("switch aggregates of " + tag.path, {tag.path}, [&](std::string& error) {
+            return TagConsoleSetCollectAggregates(tag.reference, *call.collect, instance.Verbose(),
+                                                  &error);
+        });
     }
     if (call.reset) {
         const std::vector<uint32_t> references{tag.reference};
-        Check("reset aggregates of " + tag.path,
-              TagConsoleResetAggregates(instance.Id(), &references, instance.Verbose(), &error),
-              error);
+        instance.Request("reset aggregates of " + tag.path, {tag.path}, [&](std::string& error) {
+            return TagConsoleResetAggregates(instance.Id(), &references, instance.Verbose(),
+                                             &error);
+        });
     }
     AggregatesReport report;
     report.path = tag.path;
     report.type = tag.type;
-    Check(
-        "get aggregates of " + tag.path,
-        TagConsoleGetCollectAggregates(tag.reference, instance.Verbose(), &report.collect, &error),
-        error);
+    instance.Request("get aggregates of " + tag.path, {tag.path}, [&](std::string& error) {
+        return TagConsoleGetCollectAggregates(tag.reference, instance.Verbose(), &report.collect,
+                                              &error);
+    });
     const auto values = ReadValues(instance, {tag});
     if (!values.empty()) report.value = values.front();
     return RenderAggregates(report);
@@ -251,9 +252,9 @@ Rendered Create(const Invocation& call, const ConsoleInstance& instance, OpenedT
 Rendered Delete(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
     const auto tags = RequireTags(instance, call.paths, opened);
     const auto references = References(tags);
-    std::string error;
-    Check("delete", TagConsoleDeleteTag(instance.Id(), &references, instance.Verbose(), &error),
-          error);
+    instance.Request("delete", OnePath(tags), [&](std::string& error) {
+        return TagConsoleDeleteTag(instance.Id(), &references, instance.Verbose(), &error);
+    });
     return RenderDeleted(call.paths);
 }
 

@@ -3,15 +3,28 @@
 #include <kvveldra/TagConsole.h>
 
 #include <algorithm>
+#include <chrono>
 #include <cstdio>
 
-#include "Failures.h"
+#include "BrokerProbe.h"
+#include "ConfigurationFiles.h"
+#include "LibraryText.h"
+#include "SetupAdvice.h"
+#include "StatusCodes.h"
 
 namespace kvtag {
+namespace {
 
-void Check(const std::string& operation, int32_t status, const std::string& error) {
-    if (status != 0) throw LibraryError(operation, status, error);
+// How long the knock on the broker's port after a failed connect may take.
+constexpr std::chrono::milliseconds kProbeTimeout{2000};
+
+std::string Operation(const GlobalOptions& options) {
+    // The library's text does not name the configuration; this does.
+    return options.config ? "connect with configuration '" + *options.config + "'"
+                          : std::string("connect with the default configuration");
 }
+
+}  // namespace
 
 Reservation::Reservation() {
     const int32_t status = TagConsoleReserve(&reserved_);
@@ -26,7 +39,8 @@ Reservation::~Reservation() {
     TagConsoleUnreserve(&reserved_);
 }
 
-ConsoleInstance::ConsoleInstance(const GlobalOptions& options) : verbose_(options.verbose) {
+ConsoleInstance::ConsoleInstance(const GlobalOptions& options)
+    : verbose_(options.verbose), config_(options.config) {
     const uint32_t timeoutMs = options.timeoutMs.value_or(kDefaultTimeoutMs);
     // A configuration named on the command line is that one or none.
     const bool allowFallback = !options.config.has_value();
@@ -38,10 +52,11 @@ ConsoleInstance::ConsoleInstance(const GlobalOptions& options) : verbose_(option
         // is harmless when there is none.
         std::string ignored;
         TagConsoleCloseInstance(id_, &ignored);
-        // The library's text does not name the configuration; this does.
-        throw LibraryError(options.config ? "connect with configuration '" + *options.config + "'"
-                                          : std::string("connect with the default configuration"),
-                           status, error);
+        const Prober probe = [](const std::string& host, int port) {
+            return ProbeBroker(host, port, kProbeTimeout);
+        };
+        throw LibraryError(Operation(options), status, error,
+                           ConnectAdvice(status, options.config, ReadConfigurations(), probe));
     }
 }
 
@@ -51,6 +66,18 @@ ConsoleInstance::~ConsoleInstance() {
     if (status != 0 && verbose_) {
         std::fprintf(stderr, "kvtag: closing the instance: status %d: %s\n", status, error.c_str());
     }
+}
+
+void ConsoleInstance::Request(const std::string& operation, const std::vector<std::string>& inserts,
+                              const std::function<int32_t(std::string& error)>& call) const {
+    std::string error;
+    const int32_t status = call(error);
+    if (status == 0) return;
+    const std::string advice =
+        status == status::kRequestTimedOut
+            ? ServiceTimeoutAdvice(config_, ReadConfigurations(), kLibraryRequestTimeoutMs)
+            : "";
+    throw LibraryError(operation, status, FilledLibraryText(error, inserts), advice);
 }
 
 OpenedTags::~OpenedTags() {
@@ -71,13 +98,21 @@ Listing ListTags(const ConsoleInstance& instance, const std::string& operation,
     const std::vector<std::string> search{pattern};
     Listing listing;
     std::vector<uint32_t> references;
-    std::string error;
-    const int32_t status = TagConsoleListTag(instance.Id(), &search, &properties, &keywords, skip,
-                                             take, true, instance.Verbose(), &listing.types,
-                                             &listing.paths, &references, &listing.total, &error);
     // Every listed tag is open now, whatever happens next.
-    for (const uint32_t reference : references) opened.Add(reference);
-    Check(operation, status, error);
+    const auto keepOpened = [&] {
+        for (const uint32_t reference : references) opened.Add(reference);
+    };
+    try {
+        instance.Request(operation, {pattern}, [&](std::string& error) {
+            return TagConsoleListTag(instance.Id(), &search, &properties, &keywords, skip, take,
+                                     true, instance.Verbose(), &listing.types, &listing.paths,
+                                     &references, &listing.total, &error);
+        });
+    } catch (const LibraryError&) {
+        keepOpened();
+        throw;
+    }
+    keepOpened();
     // A record needs its path, type and reference alike.
     const std::size_t complete =
         std::min({listing.paths.size(), listing.types.size(), references.size()});
@@ -103,10 +138,9 @@ std::optional<FoundTag> FindTag(const ConsoleInstance& instance, const std::stri
 FoundTag CreateTag(const ConsoleInstance& instance, const std::string& path, int32_t type,
                    OpenedTags& opened) {
     uint32_t reference = 0;
-    std::string error;
-    const int32_t status =
-        TagConsoleOpen(instance.Id(), &path, type, instance.Verbose(), &reference, &error);
-    Check("create " + path, status, error);
+    instance.Request("create " + path, {path}, [&](std::string& error) {
+        return TagConsoleOpen(instance.Id(), &path, type, instance.Verbose(), &reference, &error);
+    });
     opened.Add(reference);
     return FoundTag{path, type, reference};
 }

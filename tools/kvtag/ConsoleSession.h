@@ -1,13 +1,15 @@
 #pragma once
 
+#include <kvveldra/TagConsole.h>
+
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
 
-#include <kvveldra/TagConsole.h>
-
 #include "CommandLine.h"
+#include "Failures.h"
 
 namespace kvtag {
 
@@ -30,8 +32,11 @@ class ConsoleInstance {
 public:
     // The connect time-out when --timeout is not given.
     static constexpr uint32_t kDefaultTimeoutMs = 10000;
+    // How long the library itself waits for each answer of the tag service.
+    static constexpr uint32_t kLibraryRequestTimeoutMs = 10000;
 
-    ConsoleInstance(const GlobalOptions& options);
+    // Throws LibraryError, with what kvtag finds behind the library's status.
+    explicit ConsoleInstance(const GlobalOptions& options);
     ~ConsoleInstance();
     ConsoleInstance(const ConsoleInstance&) = delete;
     ConsoleInstance& operator=(const ConsoleInstance&) = delete;
@@ -39,11 +44,18 @@ public:
     uint64_t Id() const { return id_; }
     bool Verbose() const { return verbose_; }
 
+    // Runs one call of the library that waits for the tag service (at most
+    // the library's 10 s). A failed call throws LibraryError: a refusal that lost its inserts is filled with
+    // `inserts` ({0} first), a time-out says what was waited for.
+    void Request(const std::string& operation, const std::vector<std::string>& inserts,
+                 const std::function<int32_t(std::string& error)>& call) const;
+
 private:
     // Not 0: the default instance ignores the configuration and time-out.
     static constexpr uint64_t kInstanceId = 1;
     uint64_t id_ = kInstanceId;
     bool verbose_ = false;
+    std::optional<std::string> config_;
 };
 
 // Tag references that this run opened; each is closed once per opening,
@@ -94,8 +106,5 @@ std::optional<FoundTag> FindTag(const ConsoleInstance& instance, const std::stri
 // LibraryError.
 FoundTag CreateTag(const ConsoleInstance& instance, const std::string& path, int32_t type,
                    OpenedTags& opened);
-
-// Throws LibraryError for a non-zero status.
-void Check(const std::string& operation, int32_t status, const std::string& error);
 
 }  // namespace kvtag

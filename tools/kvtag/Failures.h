@@ -6,12 +6,15 @@
 
 namespace kvtag {
 
-// A call of the library that returned an error status, with its text.
+// A call of the library that returned an error status, with its text and,
+// after it, what kvtag found behind it.
 class LibraryError : public std::runtime_error {
 public:
-    LibraryError(const std::string& operation, int32_t status, const std::string& text)
+    LibraryError(const std::string& operation, int32_t status, const std::string& text,
+                 const std::string& advice = "")
         : std::runtime_error(operation + ": status " + std::to_string(status) + ": " +
-                             (text.empty() ? "(no text)" : text)),
+                             (text.empty() ? "(no text)" : text) +
+                             (advice.empty() ? "" : " " + advice)),
           status_(status) {}
     int32_t Status() const { return status_; }
 

@@ -1,14 +1,21 @@
 #include "HelpText.h"
 
+#include "TagTypes.h"
+
 namespace kvtag {
 namespace {
 
 constexpr const char* kGlobal =
     "Global options (anywhere on the line):\n"
-    "  --config ID     the broker configuration to use (VeldraConfigurations/ID.json\n"
-    "                  under $VELDRA_DATA_DIR); default: the library's default one\n"
-    "  --timeout MS    how long connecting to the broker may take (default 10000);\n"
-    "                  requests to the service time out after 10 s regardless\n"
+    "  --config ID     the broker configuration whose \"Id\" is ID (matched without\n"
+    "                  regard to case; the file's name does not count), among the\n"
+    "                  .json files in VeldraConfigurations under the data root\n"
+    "                  ($VELDRA_DATA_DIR, else /etc/korvane/kvveldra); default:\n"
+    "                  veldra_master, else veldra_localhost. One of those two must\n"
+    "                  exist even when --config names another\n"
+    "  --timeout MS    0 to 4294967295: how long connecting to the broker may take\n"
+    "                  (default 10000; 0: one attempt); each request then waits\n"
+    "                  up to 10 s for the tag service's answer\n"
     "  --json          print exactly one JSON document on standard output\n"
     "  --verbose       show the library's progress on standard error\n"
     "  --help, -h      show help\n";
@@ -28,10 +35,19 @@ constexpr const char* kTool =
     "  aggregates PATH   show, switch or reset the aggregates of a tag\n"
     "  delete PATH...    delete tags\n"
     "  help [COMMAND]    show help of a command ('kvtag COMMAND --help' too)\n"
-    "\n"
-    "Types: double, int32, string, bool, uint64, datetime.\n"
+    "\n";
+
+constexpr const char* kToolNotes =
     "Times: ISO 8601 with a zone, e.g. 2026-03-01T08:30:00.250000Z; printed in UTC.\n"
+    "Text output: one record a line, fields separated by tabs; in paths, values,\n"
+    "keywords and properties a backslash is shown as \\\\, a tab as \\t, a line feed\n"
+    "as \\n, a carriage return as \\r, other control characters as \\xHH.\n"
     "Exit status: 0 success, 1 usage error, 2 failure of the library or the service.\n";
+
+// The types and the other names each is known by.
+std::string TypesText() {
+    return "Types (names in any case):\n  " + TypeNameList("\n  ") + "\n";
+}
 
 const char* CommandHelp(Command command) {
     switch (command) {
@@ -43,7 +59,7 @@ const char* CommandHelp(Command command) {
                    "'*' matches any run of characters, dots included.\n"
                    "  --skip N        leave out the first N matches\n"
                    "  --take N        show at most N matches (0, the default: all)\n"
-                   "  --keyword K     only tags with keyword K (repeatable)\n"
+                   "  --keyword K     only tags with keyword K, case-sensitive (repeatable)\n"
                    "  --property K=V  only tags whose property K is V (repeatable)\n"
                    "When the page holds fewer than all matches, the count goes to standard "
                    "error.\n";
@@ -68,13 +84,13 @@ const char* CommandHelp(Command command) {
         case Command::Create:
             return "Usage: kvtag create PATH --type T\n"
                    "\n"
-                   "Creates a tag of type T (double, int32, string, bool, uint64, datetime).\n"
-                   "A tag that exists already is an error.\n";
+                   "Creates a tag of type T. A tag that exists already is an error.\n";
         case Command::Keywords:
             return "Usage: kvtag keywords PATH [--set [K...]]\n"
                    "\n"
                    "Shows the keywords of a tag, one a line. With --set, the words after PATH\n"
-                   "replace them (none: the tag keeps no keywords).\n";
+                   "replace them (none: the tag keeps no keywords). Keywords are\n"
+                   "case-sensitive.\n";
         case Command::Properties:
             return "Usage: kvtag properties PATH [--set [K=V...]]\n"
                    "\n"
@@ -84,7 +100,8 @@ const char* CommandHelp(Command command) {
             return "Usage: kvtag aggregates PATH [--collect on|off] [--reset]\n"
                    "\n"
                    "Shows whether the tag collects aggregates, and its count, average,\n"
-                   "minimum and maximum. --collect switches collecting, --reset starts the\n"
+                   "minimum and maximum; before the first sample the last three show '-'\n"
+                   "(null in JSON). --collect switches collecting, --reset starts the\n"
                    "aggregates anew; the state is shown after both.\n";
         case Command::Delete:
             return "Usage: kvtag delete PATH...\n"
@@ -99,8 +116,11 @@ const char* CommandHelp(Command command) {
 }  // namespace
 
 std::string HelpText(std::optional<Command> command) {
-    if (!command || *command == Command::Help) return std::string(kTool) + "\n" + kGlobal;
-    return std::string(CommandHelp(*command)) + "\n" + kGlobal;
+    if (!command || *command == Command::Help) {
+        return std::string(kTool) + TypesText() + "\n" + kToolNotes + "\n" + kGlobal;
+    }
+    const bool typed = *command == Command::Write || *command == Command::Create;
+    return std::string(CommandHelp(*command)) + (typed ? "\n" + TypesText() : "") + "\n" + kGlobal;
 }
 
 }  // namespace kvtag

@@ -4,6 +4,7 @@
 
 #include "JsonWriter.h"
 #include "TagTypes.h"
+#include "TextEscape.h"
 #include "TimeText.h"
 
 namespace kvtag {
@@ -28,23 +29,43 @@ std::string TimeOrDash(TagConsoleTime time) {
     return text.empty() ? "-" : text;
 }
 
+// Before the first sample the average, minimum and maximum are nothing:
+// null in JSON, "-" in text.
+bool HasSamples(const TagConsoleValue& value) {
+    return value.aggregateCount > 0;
+}
+
+void WriteExtreme(JsonWriter& json, const TagConsoleValue& value, const std::string& text) {
+    if (HasSamples(value) && !text.empty()) {
+        json.String(text);
+    } else {
+        json.Null();
+    }
+}
+
 void WriteAggregates(JsonWriter& json, const TagConsoleValue& value) {
-    json.BeginObject()
-        .Key("count")
-        .Integer(value.aggregateCount)
-        .Key("average")
-        .Number(value.aggregateAverage)
-        .Key("minimum")
-        .String(value.aggregateMinimum)
-        .Key("maximum")
-        .String(value.aggregateMaximum)
-        .EndObject();
+    json.BeginObject().Key("count").Integer(value.aggregateCount).Key("average");
+    if (HasSamples(value)) {
+        json.Number(value.aggregateAverage);
+    } else {
+        json.Null();
+    }
+    json.Key("minimum");
+    WriteExtreme(json, value, value.aggregateMinimum);
+    json.Key("maximum");
+    WriteExtreme(json, value, value.aggregateMaximum);
+    json.EndObject();
+}
+
+std::string ExtremeText(const TagConsoleValue& value, const std::string& text) {
+    return HasSamples(value) && !text.empty() ? EscapeText(text) : "-";
 }
 
 std::string AggregatesText(const TagConsoleValue& value) {
     return "count " + std::to_string(value.aggregateCount) + ", average " +
-           NumberText(value.aggregateAverage) + ", minimum " + value.aggregateMinimum +
-           ", maximum " + value.aggregateMaximum;
+           (HasSamples(value) ? NumberText(value.aggregateAverage) : "-") + ", minimum " +
+           ExtremeText(value, value.aggregateMinimum) + ", maximum " +
+           ExtremeText(value, value.aggregateMaximum);
 }
 
 }  // namespace
@@ -62,7 +83,7 @@ Rendered RenderList(const ListReport& report) {
         .Key("tags")
         .BeginArray();
     for (const auto& tag : report.tags) {
-        out.text += tag.path + "\t" + TypeName(tag.type) + "\n";
+        out.text += EscapeText(tag.path) + "\t" + TypeName(tag.type) + "\n";
         WritePathAndType(json.BeginObject(), tag.path, tag.type).EndObject();
     }
     json.EndArray().EndObject();
@@ -75,8 +96,8 @@ Rendered RenderValues(const std::vector<TagConsoleValue>& values) {
     JsonWriter json;
     json.BeginObject().Key("values").BeginArray();
     for (const auto& value : values) {
-        out.text += value.path + "\t" + TypeName(value.dataType) + "\t" + value.value + "\t" +
-                    TimeOrDash(value.timestamp);
+        out.text += EscapeText(value.path) + "\t" + TypeName(value.dataType) + "\t" +
+                    EscapeText(value.value) + "\t" + TimeOrDash(value.timestamp);
         if (value.aggregateCount > 0) out.text += "\t(" + AggregatesText(value) + ")";
         out.text += "\n";
         WritePathAndType(json.BeginObject(), value.path, value.dataType)
@@ -103,8 +124,8 @@ Rendered RenderWrites(const std::vector<WriteEntry>& writes) {
     json.BeginObject().Key("written").BeginArray();
     for (const auto& write : writes) {
         out.text += "wrote " + std::to_string(write.samples) +
-                    (write.samples == 1 ? " sample to " : " samples to ") + write.path + " (" +
-                    TypeName(write.type) + ")\n";
+                    (write.samples == 1 ? " sample to " : " samples to ") + EscapeText(write.path) +
+                    " (" + TypeName(write.type) + ")\n";
         WritePathAndType(json.BeginObject(), write.path, write.type)
             .Key("samples")
             .Integer(static_cast<int64_t>(write.samples))
@@ -118,7 +139,7 @@ Rendered RenderWrites(const std::vector<WriteEntry>& writes) {
 Rendered RenderCreated(const TagEntry& tag) {
     JsonWriter json;
     WritePathAndType(json.BeginObject(), tag.path, tag.type).EndObject();
-    return {"created " + tag.path + " (" + TypeName(tag.type) + ")\n", json.Text()};
+    return {"created " + EscapeText(tag.path) + " (" + TypeName(tag.type) + ")\n", json.Text()};
 }
 
 Rendered RenderKeywords(const std::string& path, const std::vector<std::string>& keywords) {
@@ -126,7 +147,7 @@ Rendered RenderKeywords(const std::string& path, const std::vector<std::string>&
     JsonWriter json;
     json.BeginObject().Key("path").String(path).Key("keywords").BeginArray();
     for (const auto& keyword : keywords) {
-        out.text += keyword + "\n";
+        out.text += EscapeText(keyword) + "\n";
         json.String(keyword);
     }
     json.EndArray().EndObject();
@@ -141,7 +162,7 @@ Rendered RenderProperties(const std::string& path,
     JsonWriter json;
     json.BeginObject().Key("path").String(path).Key("properties").BeginObject();
     for (const auto& [key, value] : properties) {
-        out.text += key + "=" + value + "\n";
+        out.text += EscapeText(key) + "=" + EscapeText(value) + "\n";
         json.Key(key).String(value);
     }
     json.EndObject().EndObject();
@@ -151,7 +172,7 @@ Rendered RenderProperties(const std::string& path,
 
 Rendered RenderAggregates(const AggregatesReport& report) {
     Rendered out;
-    out.text = report.path + "\t" + TypeName(report.type) + "\tcollect " +
+    out.text = EscapeText(report.path) + "\t" + TypeName(report.type) + "\tcollect " +
                (report.collect ? "on" : "off") + "\t" + AggregatesText(report.value) + "\n";
     JsonWriter json;
     WritePathAndType(json.BeginObject(), report.path, report.type)
@@ -169,7 +190,7 @@ Rendered RenderDeleted(const std::vector<std::string>& paths) {
     JsonWriter json;
     json.BeginObject().Key("deleted").BeginArray();
     for (const auto& path : paths) {
-        out.text += "deleted " + path + "\n";
+        out.text += "deleted " + EscapeText(path) + "\n";
         json.String(path);
     }
     json.EndArray().EndObject();

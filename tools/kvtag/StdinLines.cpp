@@ -71,6 +71,9 @@ std::optional<StdinLine> ParseStdinLine(const std::string& text, std::size_t lin
     line.value = words[1];
     if (words.size() == 3) {
         line.time = ParseIsoTime(words[2]);
+        if (!line.time && LacksOnlyAZone(words[2])) {
+            throw LineError(lineNumber, "the time '" + words[2] + "' has no zone: " + kAddAZone);
+        }
         if (!line.time) {
             throw LineError(lineNumber, "'" + words[2] + "' is not an ISO 8601 time with a zone");
         }

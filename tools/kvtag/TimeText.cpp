@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <cstdio>
+#include <string>
 
 namespace kvtag {
 namespace {
@@ -113,6 +114,10 @@ std::optional<TagConsoleTime> ParseIsoTime(std::string_view text) {
     const int64_t seconds = DaysFromCivil(year, month, day) * 86400 + hour * 3600 + minute * 60 +
                             second - offsetMinutes * 60;
     return TagConsoleTime(std::chrono::microseconds(seconds * 1000000 + micros));
+}
+
+bool LacksOnlyAZone(std::string_view text) {
+    return !ParseIsoTime(text) && ParseIsoTime(std::string(text) + "Z").has_value();
 }
 
 std::string FormatIsoTime(TagConsoleTime time) {

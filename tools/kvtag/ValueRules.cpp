@@ -1,6 +1,7 @@
 #include "ValueRules.h"
 
 #include <cerrno>
+#include <cmath>
 #include <cstdint>
 #include <cstdlib>
 
@@ -33,6 +34,12 @@ bool IsUInt64(const std::string& text) {
     return errno == 0;
 }
 
+// A finite text whose value is beyond the largest double: strtod gives an
+// infinity and ERANGE. Those the service cannot take either.
+bool IsBeyondDouble(int error, double value) {
+    return error == ERANGE && std::isinf(value);
+}
+
 bool IsDouble(const std::string& text) {
     if (text.empty() || text.front() == ' ' || text.front() == '\t' || text.front() == '\n') {
         return false;
@@ -40,8 +47,9 @@ bool IsDouble(const std::string& text) {
     // Hexadecimal floating texts are not decimal numbers to the service.
     if (text.find_first_of("xX") != std::string::npos) return false;
     char* end = nullptr;
-    std::strtod(text.c_str(), &end);
-    return end == text.c_str() + text.size();
+    errno = 0;
+    const double value = std::strtod(text.c_str(), &end);
+    return end == text.c_str() + text.size() && !IsBeyondDouble(errno, value);
 }
 
 // "True" or "False" for a boolean text in any case, or 1 / 0.
@@ -54,6 +62,18 @@ std::optional<std::string> BoolText(const std::string& text) {
 }
 
 }  // namespace
+
+std::string ValueRefusal(int32_t type, const std::string& text) {
+    std::string message = "'" + text + "' is not a value of type " + TypeName(type);
+    if (type == 0) {
+        errno = 0;
+        const double value = std::strtod(text.c_str(), nullptr);
+        if (IsBeyondDouble(errno, value)) message += ": it is beyond the range of a double";
+    } else if (type == 5 && LacksOnlyAZone(text)) {
+        message += std::string(": it has no zone; ") + kAddAZone;
+    }
+    return message;
+}
 
 std::optional<std::string> NormalizeValue(int32_t type, const std::string& text) {
     if (text.find('\0') != std::string::npos) return std::nullopt;

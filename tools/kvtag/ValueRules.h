@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 
@@ -12,5 +13,10 @@ namespace kvtag {
 // datetime: an ISO 8601 time with a zone, sent as UTC with microseconds;
 // string: anything without a zero byte. Numbers go out as given.
 std::optional<std::string> NormalizeValue(int32_t type, const std::string& text);
+
+// Why NormalizeValue refuses the text: "'TEXT' is not a value of type T",
+// with the reason when there is a plain one (a double beyond the range, a
+// date-time without a zone).
+std::string ValueRefusal(int32_t type, const std::string& text);
 
 }  // namespace kvtag

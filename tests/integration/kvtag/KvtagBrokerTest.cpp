@@ -6,6 +6,8 @@
 #include <unistd.h>
 
 #include <atomic>
+#include <filesystem>
+#include <fstream>
 
 #include "kvtag/KvtagProcess.h"
 #include "messagelibrary/json/JsonParser.h"
@@ -224,46 +226,136 @@ TEST_F(KvtagBrokerTest, UsageErrorsSendNothingAndHelpAnswers) {
     EXPECT_EQ(Expect(0, {"--help"}).out.find("Usage: kvtag"), 0u);
 }
 
-TEST_F(KvtagBrokerTest, AnUnreachableBrokerFailsPromptlyWithTheLibrarysStatus) {
-    // A port that was just free: connects to it are refused.
-    int port = 0;
-    {
-        const int fd = socket(AF_INET, SOCK_STREAM, 0);
-        ASSERT_GE(fd, 0);
+// A loopback port held bound but not listening: connects to it are refused,
+// and no other process takes it while this lives.
+class RefusingPort {
+public:
+    RefusingPort() : fd_(socket(AF_INET, SOCK_STREAM, 0)) {
         sockaddr_in address{};
         address.sin_family = AF_INET;
         address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
         socklen_t length = sizeof address;
-        ASSERT_EQ(bind(fd, reinterpret_cast<sockaddr*>(&address), sizeof address), 0);
-        ASSERT_EQ(getsockname(fd, reinterpret_cast<sockaddr*>(&address), &length), 0);
-        port = ntohs(address.sin_port);
-        close(fd);
+        auto* any = reinterpret_cast<sockaddr*>(&address);
+        if (bind(fd_, any, length) == 0 && getsockname(fd_, any, &length) == 0) {
+            port_ = ntohs(address.sin_port);
+        }
     }
-    BrokerSettings closed = Broker();
-    closed.AmqpPort = port;
-    ScratchDirectory root("kvveldra-kvtag-closed");
-    WriteBrokerDataRoot(closed, root.Path(), "closed_port");
-    const std::vector<std::pair<std::string, std::string>> environment{
-        {"VELDRA_DATA_DIR", root.Path()}};
+    ~RefusingPort() { close(fd_); }
+    RefusingPort(const RefusingPort&) = delete;
+    RefusingPort& operator=(const RefusingPort&) = delete;
+    int Port() const { return port_; }
 
-    KvtagRun run = RunKvtag({"--config", "closed_port", "--timeout", "500", "read", "any.tag"}, "",
-                            environment, 60);
-    EXPECT_EQ(run.exitCode, 2) << run.err;
-    EXPECT_TRUE(run.out.empty()) << run.out;
-    EXPECT_NE(run.err.find("status -"), std::string::npos) << run.err;
-    EXPECT_LT(run.elapsed, std::chrono::seconds(15));
+private:
+    int fd_;
+    int port_ = 0;
+};
 
-    run = RunKvtag({"--json", "--config", "closed_port", "--timeout", "500", "list", "*"}, "",
-                   environment, 60);
-    EXPECT_EQ(run.exitCode, 2) << run.err;
-    JsonVariant document;
-    ParseJson(run.out, document);
-    const JsonVariant* error = document.Find("error");
-    ASSERT_NE(error, nullptr);
-    EXPECT_EQ(Text(*error, "kind"), "library");
-    EXPECT_LT(error->Find("status")->AsNumber(), 0);
-    EXPECT_NE(Text(*error, "message"), "");
-    EXPECT_LT(run.elapsed, std::chrono::seconds(15));
+// A configuration of the private broker with one thing changed.
+std::string Configuration(const std::string& id, int port, const std::string& password, bool useTls,
+                          const std::string& exchange) {
+    const BrokerSettings& broker = Broker();
+    return "{\"Id\":\"" + id + "\",\"ExchangeName\":\"" + exchange + "\",\"Host\":\"" +
+           broker.Host + "\",\"Port\":" + std::to_string(port) + ",\"User\":\"" + broker.User +
+           "\",\"Password\":\"" + password + "\",\"UseTls\":" + (useTls ? "true" : "false") +
+           ",\"CertPath\":\"" + broker.CaCertPath + "\"}";
+}
+
+// Each set-up that cannot work fails at once with the library's status and
+// text first, and then names what to check.
+TEST_F(KvtagBrokerTest, EachFailingSetUpSaysWhatToCheck) {
+    const BrokerSettings& broker = Broker();
+    const std::string exchange = "kvtag.no-service." + std::to_string(getpid());
+    const RefusingPort refusing;
+    ASSERT_NE(refusing.Port(), 0);
+    const int closedPort = refusing.Port();
+    struct SetUp {
+        const char* what;
+        std::string file;  // the one configuration file; "" for none at all
+        std::string text;
+        std::vector<std::string> args;
+        std::vector<std::string> said;  // parts of the message, "@" for the file's path
+    };
+    const std::vector<SetUp> setUps = {
+        {"a data root that does not exist",
+         "",
+         "",
+         {},
+         {"status -251012: Veldra configurations "
+          "directory not found.",
+          "/absent/VeldraConfigurations: ", "VELDRA_DATA_DIR"}},
+        {"a file that does not parse",
+         "veldra_master.json",
+         "{\"Id\": \"veldra_master\",",
+         {},
+         {"status -251005: Failed to parse.", "veldra_master.json: it is not JSON: line 1"}},
+        {"only named configurations",
+         "site.json",
+         Configuration("site", broker.AmqpPort, broker.Password, false, exchange),
+         {"--config", "site"},
+         {"status -251011: No Veldra configurations available.",
+          "\"veldra_localhost\" or \"veldra_master\"", "'site' (site.json)"}},
+        {"a wrong password",
+         "veldra_master.json",
+         Configuration("veldra_master", broker.AmqpPort, "not-" + broker.Password, false, exchange),
+         {},
+         {"status -251024: AMQP error: Failed to log in.", "@",
+          broker.Host + ":" + std::to_string(broker.AmqpPort),
+          "refused the user name or password"}},
+        {"plain AMQP on the TLS port",
+         "veldra_master.json",
+         Configuration("veldra_master", broker.AmqpsPort, broker.Password, false, exchange),
+         {},
+         {"status -251", "@", broker.Host + ":" + std::to_string(broker.AmqpsPort),
+          "does not answer plain AMQP (a TLS port?) but UseTls is false"}},
+        {"TLS on the plain port",
+         "veldra_master.json",
+         Configuration("veldra_master", broker.AmqpPort, broker.Password, true, exchange),
+         {},
+         {"status -251", "@", broker.Host + ":" + std::to_string(broker.AmqpPort),
+          "answers plain AMQP but UseTls is true"}},
+        {"a port where nothing listens",
+         "veldra_master.json",
+         Configuration("veldra_master", closedPort, broker.Password, false, exchange),
+         {},
+         {"status -251022: AMQP error: Failed to open socket.", "@",
+          "nothing listens on " + broker.Host + ":" + std::to_string(closedPort)}},
+        {"an exchange without a tag service",
+         "veldra_master.json",
+         Configuration("veldra_master", broker.AmqpPort, broker.Password, false, exchange),
+         {},
+         {"status -251001: Request timed out.", "@",
+          "within 10000 ms on the exchange '" + exchange + "'", "with the same ExchangeName?"}},
+    };
+    for (const auto& setUp : setUps) {
+        SCOPED_TRACE(setUp.what);
+        ScratchDirectory root("kvveldra-kvtag-setup");
+        std::string dataRoot = root.Path() + "/absent";
+        std::string path;
+        if (!setUp.file.empty()) {
+            dataRoot = root.Path();
+            std::filesystem::create_directories(dataRoot + "/VeldraConfigurations");
+            path = dataRoot + "/VeldraConfigurations/" + setUp.file;
+            std::ofstream(path) << setUp.text;
+        }
+        std::vector<std::string> args = setUp.args;
+        args.insert(args.end(), {"--json", "--timeout", "500", "read", "any.tag"});
+        const KvtagRun run = RunKvtag(args, "", {{"VELDRA_DATA_DIR", dataRoot}}, 60);
+        EXPECT_EQ(run.exitCode, 2) << run.err;
+        // Only the request to a missing service waits, for the library's 10 s.
+        EXPECT_LT(run.elapsed, std::chrono::seconds(15));
+        for (const auto& part : setUp.said) {
+            EXPECT_NE(run.err.find(part == "@" ? path : part), std::string::npos)
+                << "missing: " << (part == "@" ? path : part) << "\nin: " << run.err;
+        }
+        // The same message, under the library's status, in the JSON document.
+        JsonVariant document;
+        ParseJson(run.out, document);
+        const JsonVariant* error = document.Find("error");
+        ASSERT_NE(error, nullptr) << run.out;
+        EXPECT_EQ(Text(*error, "kind"), "library");
+        EXPECT_LT(error->Find("status")->AsNumber(), 0);
+        EXPECT_EQ("kvtag: " + Text(*error, "message") + "\n", run.err);
+    }
 }
 
 }  // namespace

@@ -128,5 +128,22 @@ TEST_F(TagValueLogicTest, TurningCollectionOffAndOnStartsAggregatesAfresh) {
     EXPECT_EQ(Read({"a"}).at(0).aggregates->count, 0);
 }
 
+// The flag is kept on a bool or date-time tag, but nothing is counted there.
+TEST_F(TagValueLogicTest, BoolAndDateTimeTagsKeepTheFlagAndCountNothing) {
+    Create(Record("b", TagDataType::Boolean, true));
+    Create(Record("t", TagDataType::DateTime, true));
+    ASSERT_FALSE(Write({{std::string("b"), std::vector<TagValueSample>{Sample("True")}},
+                        {std::string("t"),
+                         std::vector<TagValueSample>{Sample("2026-03-01T08:30:00.250000Z")}}})
+                     .error);
+    for (const auto& value : Read({"b", "t"})) {
+        EXPECT_TRUE(value.current) << *value.path;
+        EXPECT_FALSE(value.aggregates) << *value.path;
+    }
+    for (const auto& tag : Query(JsonStringList{"b", "t"}).tags) {
+        EXPECT_EQ(tag.collectAggregates, true) << *tag.path;
+    }
+}
+
 }  // namespace
 }  // namespace Korvane::Veldra::TagService::Testing
