@@ -9,7 +9,7 @@ packages=(
   librabbitmq-dev libssl-dev openssl
   libgtest-dev libgmock-dev googletest libbenchmark-dev
   clang libclang-rt-14-dev
-  rapidjson-dev
+  rapidjson-dev libsimdjson-dev
   libsqlite3-dev
   # cpack -G DEB: dpkg-shlibdeps, file, readelf; the package test: lintian
   dpkg-dev file binutils lintian

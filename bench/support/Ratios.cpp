@@ -5,6 +5,15 @@
 namespace Korvane::Veldra::Bench {
 namespace {
 
+// A run's name without the "/min_time:2.000" that a benchmark's own minimum
+// time adds to it.
+std::string WithoutMinTime(std::string name) {
+    const std::size_t start = name.find("/min_time:");
+    if (start == std::string::npos) return name;
+    const std::size_t end = name.find_first_not_of("0123456789.", start + 10);
+    return name.erase(start, end == std::string::npos ? std::string::npos : end - start);
+}
+
 // The console's report, with each run's figures kept as well.
 class CollectingReporter : public benchmark::ConsoleReporter {
 public:
@@ -17,7 +26,7 @@ public:
         for (const Run& run : runs) {
             if (run.error_occurred) continue;
             // Aggregates keep their suffix ("_median"); plain runs lose their options.
-            std::string name = run.benchmark_name();
+            std::string name = WithoutMinTime(run.benchmark_name());
             if (run.run_type != Run::RT_Aggregate) name = name.substr(0, name.find("/iterations:"));
             figures_.Put(name, "real_time", run.GetAdjustedRealTime());
             figures_.Put(name, "cpu_time", run.GetAdjustedCPUTime());
