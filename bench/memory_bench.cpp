@@ -13,7 +13,6 @@
 #include <atomic>
 #include <cstdio>
 #include <cstdlib>
-#include <fstream>
 #include <memory>
 #include <string>
 
@@ -24,11 +23,13 @@
 #include "support/BenchBroker.h"
 #include "support/BenchServices.h"
 #include "support/Ratios.h"
+#include "support/ResidentSize.h"
 
 namespace {
 
 namespace Bus = Korvane::Veldra::MessageBus;
 namespace Bench = Korvane::Veldra::Bench;
+using Bench::ResidentKiB;
 
 constexpr int kWindow = 64;  // requests in flight
 constexpr uint32_t kReplyTimeoutMs = 10000;
@@ -54,13 +55,6 @@ public:
 private:
     Bus::Semaphore& window_;
 };
-
-long ResidentKiB() {
-    std::ifstream statm("/proc/self/statm");
-    long pages = 0, resident = 0;
-    statm >> pages >> resident;
-    return resident * (sysconf(_SC_PAGESIZE) / 1024);
-}
 
 }  // namespace
 

@@ -12,9 +12,10 @@
 #   BENCH_LOG                 where the benchmarks' own output goes (default a temp file,
 #                             named at the end)
 #
-# The console and open benchmarks start their own kvveldra-tagservice (in
-# memory) on the node. Run it on a quiet machine: the load average before and
-# after is printed with the table.
+# The console, open and scale benchmarks start their own kvveldra-tagservice
+# on the node (the scale benchmark's listing over an SQLite store it fills
+# first). Run it on a quiet machine: the load average before and after is
+# printed with the table.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
@@ -48,7 +49,7 @@ export KVVELDRA_BROKER_ENV="$envfile"
 
 load_before=$(cut -d' ' -f1-3 /proc/loadavg)
 benches=(json_bench service_roundtrip_bench console_bench client_open_bench tagservice_bench
-         trace_logger_bench)
+         trace_logger_bench scale_bench)
 for run in $(seq 1 "$runs"); do
     for bench in "${benches[@]}"; do
         [ -x "$build/bench/$bench" ] || { echo "not built: $bench" >&2; continue; }

@@ -13,18 +13,20 @@ namespace Korvane::Veldra::Bench {
 // drifts by a third within a minute; two benchmarks run one after the other
 // see different machines, and their ratio swings with it. Taken in turns,
 // the drift falls on both alike. The order alternates, so that neither always
-// finds the caches as the other left them.
-template <typename Ours, typename Theirs>
-void RunPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs) {
+// finds the caches as the other left them. tidy, when given, runs after
+// each piece of work off both clocks (to put back what the work changed).
+template <typename Ours, typename Theirs, typename Tidy>
+void RunPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs, Tidy&& tidy) {
     using Clock = std::chrono::steady_clock;
     Clock::duration oursTotal{};
     Clock::duration theirsTotal{};
     bool oursFirst = true;
     for (auto _ : state) {
-        const auto timed = [](auto& work, Clock::duration& total) {
+        const auto timed = [&tidy](auto& work, Clock::duration& total) {
             const Clock::time_point start = Clock::now();
             work();
             total += Clock::now() - start;
+            tidy();
         };
         if (oursFirst) {
             timed(ours, oursTotal);
@@ -41,6 +43,28 @@ void RunPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs) {
     };
     state.counters["ours_ns"] = perIteration(oursTotal);
     state.counters["theirs_ns"] = perIteration(theirsTotal);
+}
+
+template <typename Ours, typename Theirs>
+void RunPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs) {
+    RunPaired(state, ours, theirs, [] {});
+}
+
+// RunPaired after one untimed run of each piece: the first of a kind (a
+// service's first query after its start, a connection's first request) can
+// cost many times the rest, and would fall on one side only.
+template <typename Ours, typename Theirs, typename Tidy>
+void RunWarmPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs, Tidy&& tidy) {
+    ours();
+    tidy();
+    theirs();
+    tidy();
+    RunPaired(state, ours, theirs, tidy);
+}
+
+template <typename Ours, typename Theirs>
+void RunWarmPaired(benchmark::State& state, Ours&& ours, Theirs&& theirs) {
+    RunWarmPaired(state, ours, theirs, [] {});
 }
 
 }  // namespace Korvane::Veldra::Bench
