@@ -99,6 +99,6 @@ int main() {
                 release.answered.load());
     Bench::PrintRatio("resident size, " + std::to_string(total) + " / " +
                           std::to_string(total / 10) + " requests",
-                      static_cast<double>(end), static_cast<double>(checkpoint), "<= 1.05");
+                      static_cast<double>(end), static_cast<double>(checkpoint), "<= 1.02");
     return 0;
 }

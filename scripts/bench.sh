@@ -49,7 +49,7 @@ export KVVELDRA_BROKER_ENV="$envfile"
 
 load_before=$(cut -d' ' -f1-3 /proc/loadavg)
 benches=(json_bench service_roundtrip_bench console_bench client_open_bench tagservice_bench
-         trace_logger_bench scale_bench)
+         trace_logger_bench scale_bench wb_bench)
 for run in $(seq 1 "$runs"); do
     for bench in "${benches[@]}"; do
         [ -x "$build/bench/$bench" ] || { echo "not built: $bench" >&2; continue; }

@@ -10,6 +10,15 @@
 
 namespace Korvane::Veldra::Bench {
 
+// Sorts the times of the calls, in microseconds, and leaves their "p50_us"
+// and "p99_us" counters; nothing without times.
+inline void PutLatencies(benchmark::State& state, std::vector<double>& micros) {
+    if (micros.empty()) return;
+    std::sort(micros.begin(), micros.end());
+    state.counters["p50_us"] = micros[micros.size() / 2];
+    state.counters["p99_us"] = micros[std::min(micros.size() - 1, micros.size() * 99 / 100)];
+}
+
 // Runs call once an iteration, each on its own clock, and leaves the
 // counters "p50_us" and "p99_us" of the calls, "calls_per_s" and
 // "values_per_s" (valuesPerCall a call). call gives the text of its failure,
@@ -29,9 +38,7 @@ void TimedCalls(benchmark::State& state, int64_t valuesPerCall, Call call) {
         micros.push_back(std::chrono::duration<double, std::micro>(Clock::now() - start).count());
     }
     if (micros.empty()) return;
-    std::sort(micros.begin(), micros.end());
-    state.counters["p50_us"] = micros[micros.size() / 2];
-    state.counters["p99_us"] = micros[std::min(micros.size() - 1, micros.size() * 99 / 100)];
+    PutLatencies(state, micros);
     state.counters["calls_per_s"] =
         benchmark::Counter(static_cast<double>(micros.size()), benchmark::Counter::kIsRate);
     state.counters["values_per_s"] =

@@ -18,6 +18,16 @@ EnvelopePtr MakeEnvelope() {
 AmqpChannel::AmqpChannel(uint16_t id, std::shared_ptr<EnvelopeQueue> envelopes)
     : Id(id), Envelopes(std::move(envelopes)), ReturnEvents(std::make_shared<ReturnEventQueue>()) {}
 
+void AmqpChannel::SetDirectTaker(DirectTaker taker) {
+    std::lock_guard<std::mutex> lock(DirectMutex);
+    Direct = std::move(taker);
+}
+
+bool AmqpChannel::OfferDirect(const EnvelopePtr& envelope) {
+    std::lock_guard<std::mutex> lock(DirectMutex);
+    return Direct && Direct(envelope);
+}
+
 bool AmqpChannel::AddBinding(const std::string& queueName, const std::vector<std::string>& keys) {
     std::lock_guard<std::recursive_mutex> lock(BindingMutex);
     AmqpBinding binding{queueName, keys};

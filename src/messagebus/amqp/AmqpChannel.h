@@ -5,6 +5,7 @@
 #include <chrono>
 #include <condition_variable>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <mutex>
 #include <string>
@@ -24,6 +25,9 @@ struct EnvelopeDeleter {
 using EnvelopePtr = std::shared_ptr<amqp_envelope_t>;
 using EnvelopeQueue = SharedQueue<EnvelopePtr>;
 using ReturnEventQueue = SharedQueue<ResetEvent>;
+// Offered each delivery of a channel on the connection's reader thread before
+// it is queued; true when it took the envelope, which then is not queued.
+using DirectTaker = std::function<bool(const EnvelopePtr&)>;
 
 // A zeroed envelope owned through EnvelopeDeleter, ready for
 // amqp_consume_message.
@@ -65,6 +69,13 @@ public:
     // True when an equal binding was found and erased; the rest keep their order.
     bool RemoveBinding(const std::string& queueName, const std::vector<std::string>& keys);
     std::vector<AmqpBinding> GetBindings() const;
+    // Installs the taker the reader offers deliveries to first; an empty one
+    // removes it. Returns once no offer to the previous taker is in progress,
+    // so that its owner may go after removing it.
+    void SetDirectTaker(DirectTaker taker);
+    // True when the taker took the envelope; false (also without a taker)
+    // leaves it to be queued.
+    bool OfferDirect(const EnvelopePtr& envelope);
     // Takes a waiting notice without waiting.
     bool TryTakeReturnEvent(ResetEvent& out);
 
@@ -101,6 +112,10 @@ public:
     Semaphore ChannelReset;
 
 private:
+    // Held across each offer, so that removing the taker waits for it.
+    std::mutex DirectMutex;
+    DirectTaker Direct;  // guarded by DirectMutex
+
     mutable std::recursive_mutex BindingMutex;
     std::vector<AmqpBinding> Bindings;
     std::vector<std::string> ConsumerTags;  // guarded by BindingMutex

@@ -42,10 +42,15 @@ AmqpConsumer::AmqpConsumer(const AmqpConsumerBuilder& builder)
     Channel = Manager->CreateConsumerChannel();
     DeclareQueue();
     Manager->SetQos(Channel, 0, PrefetchCount, false);
+    if (ReceiveCallback && !RawCallback) {
+        Channel->SetDirectTaker(
+            [this](const EnvelopePtr& envelope) { return TakeOnReader(*envelope); });
+    }
     RebindThread = std::make_unique<std::thread>([this] { RebindLoop(); });
     try {
         HandlingThread = std::make_unique<std::thread>([this] { HandlingLoop(); });
     } catch (...) {
+        Channel->SetDirectTaker(nullptr);
         StopRebinding = true;
         Channel->ChannelReset.Release();
         RebindThread->join();
@@ -54,6 +59,8 @@ AmqpConsumer::AmqpConsumer(const AmqpConsumerBuilder& builder)
 }
 
 AmqpConsumer::~AmqpConsumer() {
+    // First, so that the reader no longer offers this consumer anything.
+    Channel->SetDirectTaker(nullptr);
     StopHandling = true;
     StopRebinding = true;
     Channel->ChannelReset.Release();
@@ -235,6 +242,17 @@ void AmqpConsumer::HandleOnce() {
 }
 
 bool AmqpConsumer::Recover(const std::string& line) {
+    ReportLineSafely(line);
+    try {
+        // Declare and bind anew: the failure may have left the channel unusable.
+        Channel->RequestReset();
+        return StopSignal.Acquire(kWaitMs);
+    } catch (...) {
+        return StopHandling.load();
+    }
+}
+
+void AmqpConsumer::ReportLineSafely(const std::string& line) {
     try {
         ReportLine(line);
     } catch (...) {
@@ -244,13 +262,6 @@ bool AmqpConsumer::Recover(const std::string& line) {
             Manager->Log(line);
         } catch (...) {
         }
-    }
-    try {
-        // Declare and bind anew: the failure may have left the channel unusable.
-        Channel->RequestReset();
-        return StopSignal.Acquire(kWaitMs);
-    } catch (...) {
-        return StopHandling.load();
     }
 }
 
@@ -267,10 +278,8 @@ void AmqpConsumer::Dispatch(const EnvelopePtr& envelope) {
         RawCallback(envelope);
         return;
     }
-    TracePoint rawMessages;
-    const auto logger = Logger(&rawMessages);
     if (!ReceiveCallback) {
-        if (logger) {
+        if (const auto logger = Logger()) {
             logger->Error("No callback defined for " + QueueName);
         } else {
             std::cout << "No callback defined, and no tracelogger!" << std::endl;
@@ -278,8 +287,41 @@ void AmqpConsumer::Dispatch(const EnvelopePtr& envelope) {
         return;
     }
     const auto message = MessageFromEnvelope(*envelope, ConsumerTag);
-    if (logger && rawMessages.enabled) logger->Log(rawMessages, "MsgRx | " + message->DebugText());
+    LogReceived(*message);
     ReceiveCallback->MessageReceived(message);
+}
+
+void AmqpConsumer::LogReceived(const GenericMessage& message) {
+    TracePoint rawMessages;
+    const auto logger = Logger(&rawMessages);
+    if (logger && rawMessages.enabled) logger->Log(rawMessages, "MsgRx | " + message.DebugText());
+}
+
+bool AmqpConsumer::TakeOnReader(const amqp_envelope_t& envelope) {
+    const std::string correlationId = CorrelationIdOf(envelope);
+    if (correlationId.empty() || !ReceiveCallback->MayTakeOnReader(correlationId)) return false;
+    std::shared_ptr<GenericMessage> message;
+    try {
+        message = MessageFromEnvelope(envelope, ConsumerTag);
+    } catch (...) {
+        // The handling thread meets the same failure and reports it.
+        return false;
+    }
+    try {
+        if (!ReceiveCallback->TakeOnReader(message)) return false;
+    } catch (const std::exception& error) {
+        // The taker had it: it is not handled a second time.
+        ReportLineSafely(std::string("Caught exception in message handling thread: ") +
+                         error.what());
+    } catch (...) {
+        ReportLineSafely("Caught exception in message handling thread!");
+    }
+    try {
+        LogReceived(*message);
+    } catch (...) {
+        // A failing logger costs the line, not the reply.
+    }
+    return true;
 }
 
 }  // namespace Korvane::Veldra::MessageBus

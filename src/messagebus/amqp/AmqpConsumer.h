@@ -68,9 +68,17 @@ private:
     // Steps 3 and 4 of the handling loop: one envelope, one returned notice.
     void HandleOnce();
     void Dispatch(const EnvelopePtr& envelope);
+    // On the connection's reader thread: hands a reply that a caller waits
+    // for, or that a request's own callback completes, straight over. False
+    // leaves the envelope to the handling thread.
+    bool TakeOnReader(const amqp_envelope_t& envelope);
+    // Logs the received message at the "RawMessages" point when it is on.
+    void LogReceived(const GenericMessage& message);
     // After a failed step: log, ask for a new declaration. True to end.
     bool Recover(const std::string& line);
     void ReportLine(const std::string& line);
+    // ReportLine, else the manager's log; never throws.
+    void ReportLineSafely(const std::string& line);
     // The logger and its point, as one consistent pair.
     std::shared_ptr<Interfaces::ITraceLogger> Logger(TracePoint* rawMessages = nullptr);
     void DeclareQueue();

@@ -84,14 +84,20 @@ AmqpPollingConnection::PollOutcome AmqpPollingConnection::PollUnderGate(const ti
 }
 
 void AmqpPollingConnection::Deliver(const EnvelopePtr& envelope) {
-    std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
-    const auto found = Channels.find(envelope->channel);
-    if (found == Channels.end()) {
-        // Dropped unacknowledged.
-        Log(NoConsumerLine(texts_.owner, envelope->channel));
-        return;
+    std::shared_ptr<AmqpChannel> channel;
+    {
+        std::lock_guard<std::recursive_mutex> lock(ChannelMutex);
+        const auto found = Channels.find(envelope->channel);
+        if (found == Channels.end()) {
+            // Dropped unacknowledged.
+            Log(NoConsumerLine(texts_.owner, envelope->channel));
+            return;
+        }
+        channel = found->second;
     }
-    found->second->Envelopes->Add(envelope);
+    // A reply that a caller waits for goes to it from here, without waking
+    // the channel's handling thread; everything else is queued for that thread.
+    if (!channel->OfferDirect(envelope)) channel->Envelopes->Add(envelope);
 }
 
 void AmqpPollingConnection::HandleMethod(amqp_method_number_t method, amqp_channel_t channel) {

@@ -12,6 +12,17 @@ MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope,
                            BytesText(envelope.routing_key), consumerTag, envelope.delivery_tag);
 }
 
+std::string CorrelationIdOf(const amqp_envelope_t& envelope) {
+    const amqp_basic_properties_t& properties = envelope.message.properties;
+    if ((properties._flags & AMQP_BASIC_CORRELATION_ID_FLAG) == 0 ||
+        properties.correlation_id.bytes == nullptr) {
+        return std::string();
+    }
+    const auto* text = static_cast<const char*>(properties.correlation_id.bytes);
+    const std::string correlationId(text, properties.correlation_id.len);
+    return correlationId.substr(0, correlationId.find('\0'));
+}
+
 std::shared_ptr<GenericMessage> MessageFromEnvelope(const amqp_envelope_t& envelope,
                                                     const std::string& consumerTag) {
     const amqp_bytes_t& body = envelope.message.body;

@@ -17,6 +17,9 @@ namespace Korvane::Veldra::MessageBus {
 // the envelope, which win over table entries of the same keys.
 MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope, const std::string& consumerTag);
 
+// The correlation id the headers would have: empty without one.
+std::string CorrelationIdOf(const amqp_envelope_t& envelope);
+
 // The received message: those headers and a copy of the body, so that it
 // outlives the envelope.
 std::shared_ptr<GenericMessage> MessageFromEnvelope(const amqp_envelope_t& envelope,

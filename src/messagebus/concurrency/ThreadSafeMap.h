@@ -50,6 +50,16 @@ public:
         return true;
     }
 
+    // TryTake of an entry for which shouldTake(value) is true.
+    template <typename Predicate>
+    bool TakeIf(const K& key, Predicate shouldTake, V& out) {
+        std::lock_guard<std::mutex> lock(mutex_);
+        const auto found = map_.find(key);
+        if (found == map_.end() || !shouldTake(static_cast<const V&>(found->second))) return false;
+        out = std::move(found->second);
+        map_.erase(found);
+        return true;
+    }
     bool Erase(const K& key) {
         std::lock_guard<std::mutex> lock(mutex_);
         return map_.erase(key) != 0;

@@ -294,6 +294,12 @@ void MessageService::RouteResponse(const std::shared_ptr<GenericMessage>& messag
     }
 }
 
+bool MessageService::RoutesOnReader(const std::string& messageType) const {
+    Interfaces::IResponseCallback* named = nullptr;
+    return responseCallbacks_->TryGet(messageType, named) && named != nullptr &&
+           named->RunsOnReader(messageType);
+}
+
 void MessageService::SetDefaultResponseCallback(
     std::shared_ptr<Interfaces::IBroadcastCallback> callback) {
     std::lock_guard<std::mutex> lock(callbackMutex_);

@@ -36,6 +36,8 @@ public:
     public:
         explicit MessageServiceResponseCallback(MessageService* service) : Service(service) {}
         void OnResponse(std::shared_ptr<GenericMessage> message, uint32_t state) override;
+        // As the callback registered for the response's name says.
+        bool RunsOnReader(const std::string& messageType) const override;
 
     private:
         MessageService* const Service;
@@ -177,6 +179,9 @@ private:
     template <typename Incoming>
     void Answer(const Incoming& request, const std::optional<MessageError>& error);
     void RouteResponse(const std::shared_ptr<GenericMessage>& message, uint32_t state);
+    // True when a response of the name goes to a registered callback that
+    // may run on the connection's reader.
+    bool RoutesOnReader(const std::string& messageType) const;
     void LogError(const std::string& text) const;
     std::shared_ptr<Interfaces::ITraceLogger> Logger() const;
 

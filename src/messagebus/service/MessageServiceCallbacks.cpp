@@ -9,6 +9,11 @@ void MessageService::MessageServiceResponseCallback::OnResponse(
     Service->RouteResponse(message, state);
 }
 
+bool MessageService::MessageServiceResponseCallback::RunsOnReader(
+    const std::string& messageType) const {
+    return Service->RoutesOnReader(messageType);
+}
+
 void MessageService::MessageServiceRegisterBroadcastCallback::RegisterBroadcast(
     const std::string& messageName, std::shared_ptr<Interfaces::IBroadcastCallback> callback) {
     if (messageName.empty()) return;

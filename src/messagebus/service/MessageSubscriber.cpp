@@ -84,7 +84,8 @@ void MessageSubscriber::Shutdown() {
     // Handler threads first: they may still reach the consumers to
     // acknowledge. What is queued is handled; later pushes are dropped.
     if (handlerPool_) handlerPool_->Close();
-    // Ends the consumers' threads, the last that call in here.
+    // Ends the consumers' threads and takes them off their connection's
+    // reader: the last that call in here.
     consumers_.clear();
 }
 
@@ -205,10 +206,10 @@ void MessageSubscriber::LogError(const std::string& text) {
 void MessageSubscriber::MessageReceived(std::shared_ptr<GenericMessage> message) {
     if (!message) return;
     // A waiting caller takes its response straight away: no handler, no
-    // purge, no acknowledgement.
-    SynchCallbackInfo synch;
-    if (synchCallbacks_->TryGet(message->CorrelationId(), synch) && synch.Waiter) {
-        synch.Waiter->Add(std::move(message));
+    // purge, no acknowledgement. The connection's reader hands such replies
+    // over itself; this is for any that reach the handling thread.
+    if (const auto waiter = AwaitingCaller(message->CorrelationId())) {
+        waiter->Add(std::move(message));
         return;
     }
     if (handlerPool_) {
@@ -216,6 +217,47 @@ void MessageSubscriber::MessageReceived(std::shared_ptr<GenericMessage> message)
     } else {
         HandleMessage(message);
     }
+}
+
+std::shared_ptr<ResponseWaiter> MessageSubscriber::AwaitingCaller(
+    const std::string& correlationId) const {
+    SynchCallbackInfo synch;
+    if (!synchCallbacks_->TryGet(correlationId, synch)) return nullptr;
+    return synch.Waiter;
+}
+
+bool MessageSubscriber::MayTakeOnReader(const std::string& correlationId) const {
+    SynchCallbackInfo synch;
+    CorrIdCallbackInfo byCorrelation;
+    return (synchCallbacks_->TryGet(correlationId, synch) && synch.Waiter) ||
+           corrIdCallbacks_->TryGet(correlationId, byCorrelation);
+}
+
+bool MessageSubscriber::TakeOnReader(const std::shared_ptr<GenericMessage>& message) {
+    const std::string& correlationId = message->CorrelationId();
+    if (const auto waiter = AwaitingCaller(correlationId)) {
+        waiter->Add(message);
+        return true;
+    }
+    // Asked outside the map's lock, then taken only while the entry is the
+    // one asked about: a callback registered anew meanwhile is asked again
+    // on the handling thread.
+    CorrIdCallbackInfo seen;
+    if (!corrIdCallbacks_->TryGet(correlationId, seen) || !seen.Callback ||
+        !seen.Callback->RunsOnReader(message->MessageType())) {
+        return false;
+    }
+    CorrIdCallbackInfo taken;
+    const bool same = corrIdCallbacks_->TakeIf(
+        correlationId,
+        [&](const CorrIdCallbackInfo& entry) {
+            return entry.Callback == seen.Callback && entry.State == seen.State &&
+                   entry.CreatedAt == seen.CreatedAt;
+        },
+        taken);
+    if (!same) return false;
+    taken.Callback->OnResponse(message, taken.State);
+    return true;
 }
 
 void MessageSubscriber::HandleMessage(const std::shared_ptr<GenericMessage>& message) {

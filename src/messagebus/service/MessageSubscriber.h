@@ -77,6 +77,14 @@ public:
     // A returned publish: fails its synchronous waiter, or drops its
     // correlation callback.
     void PublishFailed(const ResetEvent& event);
+    // ---- What the connection's reader calls ----
+    // A reply that a synchronous caller waits for, or whose correlation
+    // callback only completes a request (IResponseCallback::RunsOnReader),
+    // is taken there, without waking the handling thread. MayTakeOnReader is
+    // the cheap look before the message is built; TakeOnReader hands it over
+    // and is false when no such taker is left.
+    bool MayTakeOnReader(const std::string& correlationId) const;
+    bool TakeOnReader(const std::shared_ptr<GenericMessage>& message);
 
     // ---- The callback maps, for the message service ----
     const std::shared_ptr<SynchCallbackMap>& SynchCallbacks() const { return synchCallbacks_; }
@@ -88,6 +96,8 @@ public:
 
 private:
     void HandleMessage(const std::shared_ptr<GenericMessage>& message);
+    // The waiter of a synchronous caller for the correlation id, or null.
+    std::shared_ptr<ResponseWaiter> AwaitingCaller(const std::string& correlationId) const;
     void HandleUnhandled(const GenericMessage& message);
     void Purge();
     // Erases the correlation callbacks whose requests timed out.

@@ -10,6 +10,14 @@ void MessageSubscriberReceiveCallback::MessageReceived(std::shared_ptr<GenericMe
     Subscriber->MessageReceived(std::move(message));
 }
 
+bool MessageSubscriberReceiveCallback::MayTakeOnReader(const std::string& correlationId) {
+    return Subscriber->MayTakeOnReader(correlationId);
+}
+
+bool MessageSubscriberReceiveCallback::TakeOnReader(const std::shared_ptr<GenericMessage>& message) {
+    return Subscriber->TakeOnReader(message);
+}
+
 void MessageSubscriberReceiveCallback::PublishFailed(const ResetEvent& event) {
     Subscriber->PublishFailed(event);
 }

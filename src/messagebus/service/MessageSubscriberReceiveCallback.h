@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 
 #include "messagebus/interfaces/IMessageSubscriberReceiveCallback.h"
 
@@ -17,6 +18,8 @@ public:
 
     void MessageReceived(std::shared_ptr<GenericMessage> message) override;
     void PublishFailed(const ResetEvent& event) override;
+    bool MayTakeOnReader(const std::string& correlationId) override;
+    bool TakeOnReader(const std::shared_ptr<GenericMessage>& message) override;
 
 private:
     MessageSubscriber* const Subscriber;

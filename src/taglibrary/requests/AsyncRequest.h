@@ -25,8 +25,9 @@ public:
     // 0 for a reply without error. No reply: "Veldra.RequestTimedOut". An
     // error reply: the registered text of its name with its arguments.
     virtual int32_t CheckResult(const TagIngestion::Errors& errors, std::string& error);
-    // Stores the reply and wakes whoever waits. Runs on the bus thread with
-    // the map's mutex held: must not block. False when nobody can be woken
+    // Stores the reply and wakes whoever waits. Runs on a bus thread (the
+    // consumer connection's reader, else the handling thread) with the map's
+    // mutex held: must not block. False when nobody can be woken
     // any more, and the request is then dropped from the map.
     virtual bool Complete(std::shared_ptr<GenericMessage> reply) = 0;
 

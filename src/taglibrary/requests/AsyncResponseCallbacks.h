@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 
 #include "messagebus/interfaces/IResponseCallback.h"
 #include "taglibrary/requests/AsyncRequestMap.h"
@@ -13,6 +14,8 @@ public:
     explicit GenericAsyncResponseCallback(std::shared_ptr<AsyncRequestMap> requests)
         : requests_(std::move(requests)) {}
     void OnResponse(std::shared_ptr<GenericMessage> reply, uint32_t state) override;
+    // Completing a request never blocks and runs no caller's code.
+    bool RunsOnReader(const std::string&) const override { return true; }
 
 private:
     const std::shared_ptr<AsyncRequestMap> requests_;
@@ -25,6 +28,8 @@ public:
     explicit IgnoringAsyncResponseCallback(std::shared_ptr<AsyncRequestMap> requests)
         : inner_(std::move(requests)) {}
     void OnResponse(std::shared_ptr<GenericMessage> reply, uint32_t state) override;
+    // Completing a request never blocks and runs no caller's code.
+    bool RunsOnReader(const std::string&) const override { return true; }
 
 private:
     GenericAsyncResponseCallback inner_;

@@ -3,11 +3,13 @@
 #include <future>
 #include <memory>
 #include <string>
+#include <thread>
 
 #include "ServiceTestSupport.h"
 #include "errors/AmqpException.h"
 #include "errors/ErrorTable.h"
 #include "support/CatchVeldra.h"
+#include "messagebus/interfaces/FunctionBroadcastCallback.h"
 #include "messagelibrary/GenericResponse.h"
 
 namespace Korvane::Veldra::Testing {
@@ -95,6 +97,73 @@ TEST_F(ServiceRequest, SecondRequestWithTheSameCorrelationIdWaitsInVainAndEndsTh
             },
             kArrival));
     }
+}
+
+// A handler that asks another service and waits for the answer: the answer
+// must not queue behind the handler on its own handling thread.
+TEST_F(ServiceRequest, RequestFromInsideAHandlerIsAnswered) {
+    std::promise<MessagePtr> answer;
+    const auto asker = std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
+        [&](const GenericMessage&) {
+            TestRequest inner("EchoRequest", server.QueueName());
+            answer.set_value(client.SendRequest(inner, 5000));
+        });
+    client.Subscriber()->RegisterMessageCallback("Ask", asker, false);
+    responder->Open();
+    TestRequest ask("Ask", client.QueueName());
+    server.Publish(ask);
+    auto result = answer.get_future();
+    ASSERT_EQ(result.wait_for(kArrival), std::future_status::ready);
+    EXPECT_NE(result.get(), nullptr);
+}
+
+// A response callback that only completes a request is run by the
+// connection's reader, even while the handling thread is busy; any other
+// callback still runs on the handling thread.
+TEST_F(ServiceRequest, OnlyCallbacksThatCompleteARequestRunOnTheReader) {
+    struct Recorder : InboxCallback {
+        explicit Recorder(bool onReader) : onReader(onReader) {}
+        bool RunsOnReader(const std::string&) const override { return onReader; }
+        void OnResponse(MessagePtr message, uint32_t state) override {
+            thread = std::this_thread::get_id();
+            InboxCallback::OnResponse(std::move(message), state);
+        }
+        const bool onReader;
+        std::thread::id thread;
+    };
+    std::promise<std::thread::id> handling;
+    std::promise<void> release;
+    const auto released = release.get_future().share();
+    const auto hold = std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
+        [&](const GenericMessage&) {
+            handling.set_value(std::this_thread::get_id());
+            released.wait_for(kArrival);
+        });
+    client.Subscriber()->RegisterMessageCallback("Hold", hold, false);
+    responder->Open();
+    TestRequest holdIt("Hold", client.QueueName());
+    server.Publish(holdIt);
+    auto handlingThread = handling.get_future();
+    ASSERT_EQ(handlingThread.wait_for(kArrival), std::future_status::ready);
+
+    Recorder completing(true), plain(false);
+    client.RegisterResponseCallback("GenericResponse", &completing);
+    TestRequest first("EchoRequest", server.QueueName());
+    client.SendRequestAsync(first, 7);
+    const bool firstCame = completing.WaitFor(first.CorrelationId(), kArrival).has_value();
+    client.UnregisterResponseCallback("GenericResponse");
+    client.RegisterResponseCallback("GenericResponse", &plain);
+    TestRequest second("EchoRequest", server.QueueName());
+    client.SendRequestAsync(second, 8);
+    release.set_value();
+    const bool secondCame = plain.WaitFor(second.CorrelationId(), kArrival).has_value();
+    client.UnregisterResponseCallback("GenericResponse");
+
+    const std::thread::id handler = handlingThread.get();
+    ASSERT_TRUE(firstCame);
+    EXPECT_NE(completing.thread, handler);
+    ASSERT_TRUE(secondCame);
+    EXPECT_EQ(plain.thread, handler);
 }
 
 TEST_F(ServiceRequest, MandatoryRequestToAMissingServiceFailsWithTheReturnNotice) {
