@@ -6,8 +6,10 @@
 #                                   the libkvveldra_tag.so link
 #   tools   -> kvveldra-tools       the command-line tools and the reference
 #                                   tag service
+#   python  -> python3-kvveldra     the Python module kvveldra in Debian's
+#                                   dist-packages (when the tree builds it)
 #
-# Only these three components are packaged. Whatever installs under another
+# Only these components are packaged. Whatever installs under another
 # component or under none ("Unspecified") stays out of every package; tests,
 # benchmarks and the host stand-in install nothing at all. The demo installs as
 # component "demo" and is left out: it runs only against a broker and a service
@@ -41,6 +43,10 @@ set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_COMPONENTS_ALL runtime dev tools)
 set(CPACK_COMPONENT_DEV_DEPENDS runtime)
 set(CPACK_COMPONENT_TOOLS_DEPENDS runtime)
+if(TARGET _kvveldra)
+  list(APPEND CPACK_COMPONENTS_ALL python)
+  set(CPACK_COMPONENT_PYTHON_DEPENDS runtime)
+endif()
 
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_RELEASE ${KVVELDRA_PACKAGE_RELEASE})
@@ -100,6 +106,21 @@ set(CPACK_DEBIAN_TOOLS_DESCRIPTION
 Command-line tools for the tag library and kvveldra-tagservice, a reference tag
 service that keeps tags in memory or in an SQLite file and answers on the
 message bus.")
+
+set(CPACK_DEBIAN_PYTHON_PACKAGE_NAME python3-kvveldra)
+set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
+# The extension is built for one Python version, the interpreter's of the build.
+if(TARGET _kvveldra)
+  math(EXPR kvveldra_python_next "${KVVELDRA_PYTHON_MINOR} + 1")
+  set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS
+    "python3 (>= ${KVVELDRA_PYTHON_MAJOR}.${KVVELDRA_PYTHON_MINOR}), python3 (<< ${KVVELDRA_PYTHON_MAJOR}.${kvveldra_python_next})")
+endif()
+set(CPACK_DEBIAN_PYTHON_DESCRIPTION
+  "Client library for a tag service - Python module
+The module kvveldra: a Client that opens, creates and lists tags, and Tag
+objects that write and read values, keywords, properties and aggregates,
+with Python's own types and exceptions, over the library's blocking
+TagConsole functions. Type stubs are included.")
 
 include(${CMAKE_CURRENT_LIST_DIR}/DebianFiles.cmake)
 include(CPack)

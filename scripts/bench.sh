@@ -59,6 +59,17 @@ for run in $(seq 1 "$runs"); do
 done
 echo "== memory_bench" | tee -a "$log" >&2
 "$build/bench/memory_bench" >>"$log" 2>&1 || echo "memory_bench failed (see $log)" >&2
+
+# The Python module's tag.write beside the C++ call (python/bench/write_bench.py),
+# when the tree built the module.
+if [ -x "$build/python/python_write_bench" ] && [ -f "$build/python/kvveldra/__init__.py" ]; then
+    for run in $(seq 1 "$runs"); do
+        echo "== run $run: python write_bench" | tee -a "$log" >&2
+        PYTHONPATH="$build/python" KVVELDRA_TAGSERVICE="$build/tools/tagservice/kvveldra-tagservice" \
+            /usr/bin/python3 python/bench/write_bench.py --cpp "$build/python/python_write_bench" \
+            >>"$log" 2>&1 || echo "python write_bench failed (see $log)" >&2
+    done
+fi
 load_after=$(cut -d' ' -f1-3 /proc/loadavg)
 
 # "ratio | what | value | target" lines, the same what once per run: one row

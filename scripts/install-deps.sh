@@ -11,6 +11,8 @@ packages=(
   clang libclang-rt-14-dev
   rapidjson-dev libsimdjson-dev
   libsqlite3-dev
+  # the Python module kvveldra and its tests
+  pybind11-dev python3-dev python3-pytest
   # cpack -G DEB: dpkg-shlibdeps, file, readelf; the package test: lintian
   dpkg-dev file binutils lintian
 )

@@ -12,13 +12,14 @@
 #   PROJECT_VERSION                      the upstream version, e.g. 1.0.0
 #   CMAKE CPACK CXX GENERATOR MAKE_PROGRAM
 #   EXPECT_KVTAG                         1 when the tree has the kvtag tool
+#   EXPECT_PYTHON                        1 when the tree has the Python module
 set -euo pipefail
 
 # shellcheck source=tests/package/consumer_lib.sh
 source "$(dirname "$0")/consumer_lib.sh"
 
 for v in SOURCE_DIR BUILD_DIR CONSUMER_DIR WORK_DIR PROJECT_VERSION CMAKE CPACK \
-    CXX GENERATOR MAKE_PROGRAM EXPECT_KVTAG; do
+    CXX GENERATOR MAKE_PROGRAM EXPECT_KVTAG EXPECT_PYTHON; do
     [ -n "${!v:-}" ] || fail "$v is not set"
 done
 case "$WORK_DIR" in
@@ -51,12 +52,14 @@ case "$version" in
 esac
 
 declare -A deb
-for name in libkvveldra-tag1 libkvveldra-tag-dev kvveldra-tools; do
+names=(libkvveldra-tag1 libkvveldra-tag-dev kvveldra-tools)
+[ "$EXPECT_PYTHON" != 1 ] || names+=(python3-kvveldra)
+for name in "${names[@]}"; do
     deb[$name]="$WORK_DIR/debs/${name}_${version}_$arch.deb"
     [ -f "${deb[$name]}" ] || fail "missing ${deb[$name]##*/}; found: $(ls "$WORK_DIR/debs")"
 done
 found=$(find "$WORK_DIR/debs" -maxdepth 1 -name '*.deb' | wc -l)
-[ "$found" -eq 3 ] || fail "cpack made $found packages, not 3: $(ls "$WORK_DIR/debs")"
+[ "$found" -eq ${#names[@]} ] || fail "cpack made $found packages, not ${#names[@]}: $(ls "$WORK_DIR/debs")"
 
 # field PACKAGE NAME: one control field of one package.
 field() { dpkg-deb -f "${deb[$1]}" "$2"; }
@@ -79,7 +82,7 @@ for lib in 'librabbitmq[0-9]+' 'libssl[0-9.]+' 'libstdc\+\+6' 'libc6'; do
 done
 has_depends kvveldra-tools 'libsqlite3-0( \(.*\))?' ||
     fail "kvveldra-tools does not depend on libsqlite3-0: $(field kvveldra-tools Depends)"
-for name in libkvveldra-tag-dev kvveldra-tools; do
+for name in "${names[@]:1}"; do
     has_depends "$name" "libkvveldra-tag1 \(= ${version//./\\.}\)" ||
         fail "$name does not depend on libkvveldra-tag1 (= $version): $(field "$name" Depends)"
 done
@@ -149,6 +152,19 @@ expect kvveldra-tools -rwxr-xr-x usr/bin/kvveldra-tagservice
 [ "$EXPECT_KVTAG" != 1 ] || expect kvveldra-tools -rwxr-xr-x usr/bin/kvtag
 only kvveldra-tools "usr/bin/(kvveldra-tagservice|kvtag)|usr/share/man/man1/[^/]+\\.1\\.gz|$(debian_files kvveldra-tools)"
 
+# The Python module in Debian's dist-packages, the extension with its stubs.
+pydir=usr/lib/python3/dist-packages/kvveldra
+if [ "$EXPECT_PYTHON" = 1 ]; then
+    has_depends python3-kvveldra 'python3 \(>= 3\.[0-9]+\)' ||
+        fail "python3-kvveldra does not depend on python3: $(field python3-kvveldra Depends)"
+    for file in __init__.py _errors.py _records.py _kvveldra.pyi py.typed; do
+        expect python3-kvveldra -rw-r--r-- "$pydir/$file"
+    done
+    only python3-kvveldra "${pydir//./\\.}/([a-z_]+\\.pyi?|py\\.typed|_kvveldra(\\.cpython-[0-9a-z_-]+)?\\.so)|$(debian_files python3-kvveldra)"
+    grep -Eq " ${pydir//./\\.}/_kvveldra(\\.cpython-[0-9a-z_-]+)?\\.so\$" "$logs/python3-kvveldra.contents" ||
+        fail "python3-kvveldra has no extension _kvveldra*.so"
+fi
+
 # ---------------------------------------------------------------- lintian
 # No error and no warning; the info tags that remain are printed.
 command -v lintian >/dev/null || fail "lintian is not installed (scripts/install-deps.sh installs it)"
@@ -193,6 +209,18 @@ service_runpath=$(dynamic RUNPATH "$service")
 [ -n "$service_runpath" ] || service_runpath=$(dynamic RPATH "$service")
 [ -f "${service_runpath/\$ORIGIN/$usr/bin}/libkvsslinit.so.13" ] ||
     fail "kvveldra-tagservice's RUNPATH '$service_runpath' does not lead to libkvsslinit.so.13"
+
+# The module imports from the root with Debian's interpreter, which its
+# package is built for, and finds the root's library.
+if [ "$EXPECT_PYTHON" = 1 ]; then
+    PYTHONPATH="$root/usr/lib/python3/dist-packages" LD_LIBRARY_PATH="$root/$lib" /usr/bin/python3 -c '
+import kvveldra, pathlib, sys
+assert kvveldra.__file__.startswith(sys.argv[1]), kvveldra.__file__
+assert (kvveldra.DOUBLE, kvveldra.DATETIME) == (0, 5) and issubclass(kvveldra.TimeoutError, TimeoutError)
+folder = pathlib.Path(kvveldra.__file__).parent
+assert (folder / "py.typed").is_file() and "class Client" in (folder / "_kvveldra.pyi").read_text()
+' "$root" >"$logs/python-import" 2>&1 || fail_log "$logs/python-import" "kvveldra does not import from the unpacked root"
+fi
 
 # ---------------------------------------------------------------- consumers
 # Through find_package: the CMake package of the root alone.
