@@ -47,6 +47,13 @@ constexpr uint64_t AnyEqual(uint64_t bytes, unsigned char c) noexcept {
     return AnyBelow(bytes ^ (kOnes * c), 1);
 }
 
+// Whether none of the eight bytes needs an escape or ends the text.
+inline __attribute__((always_inline)) bool AllPlain(uint64_t bytes) noexcept {
+    // Below 32 covers the zero byte and every control character.
+    return (AnyBelow(bytes, 32) | AnyEqual(bytes, '"') | AnyEqual(bytes, '\\') |
+            AnyEqual(bytes, 127)) == 0;
+}
+
 }  // namespace
 
 std::size_t JsonPlainPrefix(std::string_view text) noexcept {
@@ -56,10 +63,7 @@ std::size_t JsonPlainPrefix(std::string_view text) noexcept {
     for (; i + 8 <= size; i += 8) {
         uint64_t bytes;
         std::memcpy(&bytes, data + i, sizeof(bytes));
-        // Below 32 covers the zero byte and every control character.
-        if (AnyBelow(bytes, 32) | AnyEqual(bytes, '"') | AnyEqual(bytes, '\\') |
-            AnyEqual(bytes, 127))
-            break;
+        if (!AllPlain(bytes)) break;
     }
     for (; i < size; ++i) {
         if (data[i] == '\0' || Escape(data[i]) != 0) break;
@@ -79,7 +83,41 @@ std::size_t JsonEscapedLength(std::string_view text) noexcept {
 
 char* WriteJsonEscaped(char* out, std::string_view text) noexcept {
     static constexpr char kHex[] = "0123456789abcdef";
-    for (const char c : text) {
+    // Eight plain bytes at a time, as they stand; the first piece with a
+    // byte to escape, and the tail, byte by byte.
+    const char* data = text.data();
+    const std::size_t size = text.size();
+    if (size >= 4 && size < 8) {
+        // A short text (a key, mostly) as two overlapping halves.
+        uint32_t first, last;
+        std::memcpy(&first, data, sizeof(first));
+        std::memcpy(&last, data + size - 4, sizeof(last));
+        if (AllPlain(uint64_t{first} | uint64_t{last} << 32)) {
+            std::memcpy(out, &first, sizeof(first));
+            std::memcpy(out + size - 4, &last, sizeof(last));
+            return out + size;
+        }
+    }
+    std::size_t i = 0;
+    for (; i + 8 <= size; i += 8) {
+        uint64_t bytes;
+        std::memcpy(&bytes, data + i, sizeof(bytes));
+        if (!AllPlain(bytes)) break;
+        std::memcpy(out, &bytes, sizeof(bytes));
+        out += sizeof(bytes);
+    }
+    if (i + 8 > text.size() && i != text.size() && text.size() >= 8) {
+        // A tail after nothing but plain pieces: its last eight bytes,
+        // overlapping what was written, in one piece when they are plain.
+        uint64_t bytes;
+        std::memcpy(&bytes, data + text.size() - 8, sizeof(bytes));
+        if (AllPlain(bytes)) {
+            const std::size_t tail = text.size() - i;
+            std::memcpy(out - (8 - tail), &bytes, sizeof(bytes));
+            return out + tail;
+        }
+    }
+    for (const char c : text.substr(i)) {
         if (c == '\0') break;
         const char e = Escape(c);
         if (e == 0) {

@@ -67,7 +67,7 @@ bool ReadJsonValue(Timestamp& out, const JsonVariant* value) {
     out = Timestamp(boost::posix_time::not_a_date_time);
     if (value == nullptr) return true;
     if (!value->IsString()) return false;
-    return ParseTimestamp(std::string(value->AsText()), out);
+    return ParseTimestamp(value->AsText(), out);
 }
 
 bool ReadJsonValue(std::string& out, const JsonVariant* value) {

@@ -10,85 +10,91 @@ namespace Korvane::Veldra::VeldraMessageLibrary {
 namespace {
 
 template <typename T, typename... Format>
-void AppendChars(std::string& out, T value, Format... format) {
-    char buffer[40];
-    const auto result = std::to_chars(buffer, buffer + sizeof(buffer), value, format...);
-    out.append(buffer, result.ptr);
+void AppendChars(JsonOutput& out, T value, Format... format) {
+    constexpr std::size_t kMostChars = 40;
+    char* at = out.Room(kMostChars);
+    out.Advance(std::to_chars(at, at + kMostChars, value, format...).ptr);
+}
+
+// Texts this long are measured before they are written; shorter ones get
+// room for the longest escape of every byte and are written in one pass.
+constexpr std::size_t kMeasuredTextSize = 4096;
+
+// `text` escaped and between quotes, after `before` and followed by `after`
+// (each of at most two bytes).
+void AppendQuoted(JsonOutput& out, std::string_view before, std::string_view text,
+                  std::string_view after) {
+    const std::size_t escaped =
+        text.size() < kMeasuredTextSize ? text.size() * 6 : JsonEscapedLength(text);
+    char* at = out.Room(before.size() + escaped + after.size() + 2);
+    for (const char c : before) *at++ = c;
+    *at++ = '"';
+    at = WriteJsonEscaped(at, text);
+    *at++ = '"';
+    for (const char c : after) *at++ = c;
+    out.Advance(at);
 }
 
 }  // namespace
 
-void AppendJsonNull(std::string& out) {
-    out.append("null", 4);
+void AppendJsonNull(JsonOutput& out) {
+    out.Append("null", 4);
 }
 
-void AppendJsonBool(std::string& out, bool value) {
+void AppendJsonBool(JsonOutput& out, bool value) {
     if (value) {
-        out.append("true", 4);
+        out.Append("true", 4);
     } else {
-        out.append("false", 5);
+        out.Append("false", 5);
     }
 }
 
-void AppendJsonInt32(std::string& out, int32_t value) {
+void AppendJsonInt32(JsonOutput& out, int32_t value) {
     AppendChars(out, value);
 }
 
-void AppendJsonInt64(std::string& out, int64_t value) {
+void AppendJsonInt64(JsonOutput& out, int64_t value) {
     AppendChars(out, value);
 }
 
-void AppendJsonDouble(std::string& out, double value) {
+void AppendJsonDouble(JsonOutput& out, double value) {
     if (std::isnan(value)) {
-        out.append("NaN", 3);
+        out.Append("NaN", 3);
     } else if (std::isinf(value)) {
-        out.append(value > 0 ? "Infinity" : "-Infinity");
+        out.Append(value > 0 ? "Infinity" : "-Infinity");
     } else {
         // The same digits as "%.17g", but always with a "." whatever the locale.
         AppendChars(out, value, std::chars_format::general, 17);
     }
 }
 
-void AppendJsonTimestamp(std::string& out, const Timestamp& value) {
-    out.push_back('"');
-    AppendTimestampText(value, out);
-    out.push_back('"');
+void AppendJsonTimestamp(JsonOutput& out, const Timestamp& value) {
+    char* at = out.Room(kTimestampTextMax + 2);
+    *at++ = '"';
+    at = WriteTimestampText(value, at);
+    *at++ = '"';
+    out.Advance(at);
 }
 
-void AppendJsonString(std::string& out, std::string_view text) {
-    // Most texts need no escape: they are copied in one piece.
-    const std::size_t plain = JsonPlainPrefix(text);
-    if (plain == text.size() || text[plain] == '\0') {
-        out.push_back('"');
-        out.append(text.data(), plain);
-        out.push_back('"');
-        return;
-    }
-    const std::size_t length = JsonEscapedLength(text);
-    const std::size_t start = out.size();
-    out.resize(start + length + 2);
-    char* p = out.data() + start;
-    *p++ = '"';
-    p = WriteJsonEscaped(p, text);
-    *p = '"';
+void AppendJsonString(JsonOutput& out, std::string_view text) {
+    AppendQuoted(out, {}, text, {});
 }
 
-void AppendJsonBase64(std::string& out, const void* data, std::size_t size) {
-    out.push_back('"');
-    AppendBase64(out, data, size);
-    out.push_back('"');
+void AppendJsonBase64(JsonOutput& out, const void* data, std::size_t size) {
+    out.Put('"');
+    const std::string text = Base64Encode(data, size);
+    out.Append(text.data(), text.size());
+    out.Put('"');
 }
 
 void JsonObjectWriter::AppendKey(std::string_view key) {
-    if (!first_) out_.push_back(',');
+    AppendQuoted(out_, first_ ? std::string_view() : std::string_view(","), key, ":");
     first_ = false;
-    AppendJsonString(out_, key);
-    out_.push_back(':');
 }
 
 namespace JsonWriteDetail {
 
-void AppendEnum(std::string& out, int32_t value, const JsonEnumTexts& texts) {
+void AppendEnum(JsonOutput& out, int32_t value, const JsonEnumTexts& texts) {
     const char* text = texts.TextOf(value);
     AppendJsonString(out, text == nullptr ? std::string_view() : std::string_view(text));
 }

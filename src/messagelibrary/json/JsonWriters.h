@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "messagelibrary/json/JsonEnum.h"
+#include "messagelibrary/json/JsonOutput.h"
 #include "messagelibrary/json/Timestamp.h"
 
 // Writing message bodies as text. Bodies are concatenated directly, without
@@ -76,20 +77,20 @@ struct IsJsonWritableRecord<R, std::void_t<decltype(WriteJsonFields(
 
 // ---- Single values ----------------------------------------------------------
 
-void AppendJsonNull(std::string& out);
-void AppendJsonBool(std::string& out, bool value);
-void AppendJsonInt32(std::string& out, int32_t value);
-void AppendJsonInt64(std::string& out, int64_t value);
-void AppendJsonDouble(std::string& out, double value);
-void AppendJsonTimestamp(std::string& out, const Timestamp& value);
+void AppendJsonNull(JsonOutput& out);
+void AppendJsonBool(JsonOutput& out, bool value);
+void AppendJsonInt32(JsonOutput& out, int32_t value);
+void AppendJsonInt64(JsonOutput& out, int64_t value);
+void AppendJsonDouble(JsonOutput& out, double value);
+void AppendJsonTimestamp(JsonOutput& out, const Timestamp& value);
 // A quoted, escaped string; the text ends at its first zero byte, if any.
-void AppendJsonString(std::string& out, std::string_view text);
+void AppendJsonString(JsonOutput& out, std::string_view text);
 // A quoted base64 text of the bytes (Base64.h).
-void AppendJsonBase64(std::string& out, const void* data, std::size_t size);
+void AppendJsonBase64(JsonOutput& out, const void* data, std::size_t size);
 
 // Any type of the table above.
 template <typename T>
-void AppendJson(std::string& out, const T& value);
+void AppendJson(JsonOutput& out, const T& value);
 
 // ---- Objects ----------------------------------------------------------------
 
@@ -97,7 +98,7 @@ void AppendJson(std::string& out, const T& value);
 // field as "key":value with commas between, then "}" from Close().
 class JsonObjectWriter {
 public:
-    explicit JsonObjectWriter(std::string& out) : out_(out) { out_.push_back('{'); }
+    explicit JsonObjectWriter(JsonOutput& out) : out_(out) { out_.Put('{'); }
     JsonObjectWriter(const JsonObjectWriter&) = delete;
     JsonObjectWriter& operator=(const JsonObjectWriter&) = delete;
 
@@ -108,12 +109,12 @@ public:
         return *this;
     }
     // Appends "}". Call exactly once, after the last field.
-    void Close() { out_.push_back('}'); }
+    void Close() { out_.Put('}'); }
 
 private:
     void AppendKey(std::string_view key);
 
-    std::string& out_;
+    JsonOutput& out_;
     bool first_ = true;
 };
 
@@ -121,7 +122,7 @@ private:
 class JsonBodyWriter {
 public:
     JsonBodyWriter() : object_(text_) {}
-    explicit JsonBodyWriter(std::size_t reserve) : JsonBodyWriter() { text_.reserve(reserve); }
+    explicit JsonBodyWriter(std::size_t reserve) : text_(reserve), object_(text_) {}
 
     template <typename T>
     JsonBodyWriter& Field(std::string_view key, const T& value) {
@@ -131,18 +132,18 @@ public:
     // Closes the object and hands out the text; the writer is spent.
     std::string Finish() {
         object_.Close();
-        return std::move(text_);
+        return text_.Take();
     }
 
 private:
-    std::string text_;  // declared before object_, which writes into it
+    JsonOutput text_;  // declared before object_, which writes into it
     JsonObjectWriter object_;
 };
 
 // ---- Template definitions ---------------------------------------------------
 
 namespace JsonWriteDetail {
-void AppendEnum(std::string& out, int32_t value, const JsonEnumTexts& texts);
+void AppendEnum(JsonOutput& out, int32_t value, const JsonEnumTexts& texts);
 template <typename T>
 struct IsOptional : std::false_type {};
 template <typename T>
@@ -160,7 +161,7 @@ inline constexpr bool kAlwaysFalse = false;
 }  // namespace JsonWriteDetail
 
 template <typename T>
-void AppendJson(std::string& out, const T& value) {
+void AppendJson(JsonOutput& out, const T& value) {
     using namespace JsonWriteDetail;
     if constexpr (std::is_same_v<T, bool>) {
         AppendJsonBool(out, value);
@@ -173,7 +174,7 @@ void AppendJson(std::string& out, const T& value) {
     } else if constexpr (std::is_same_v<T, Timestamp>) {
         AppendJsonTimestamp(out, value);
     } else if constexpr (std::is_same_v<T, JsonRaw>) {
-        out.append(value.text.data(), value.text.size());
+        out.Append(value.text.data(), value.text.size());
     } else if constexpr (std::is_same_v<T, const char*> || std::is_same_v<T, char*>) {
         if (value == nullptr) {
             AppendJsonNull(out);
@@ -189,14 +190,14 @@ void AppendJson(std::string& out, const T& value) {
             AppendJsonNull(out);
         }
     } else if constexpr (IsVector<T>::value) {
-        out.push_back('[');
+        out.Put('[');
         bool first = true;
         for (const auto& element : value) {
-            if (!first) out.push_back(',');
+            if (!first) out.Put(',');
             first = false;
             AppendJson(out, element);
         }
-        out.push_back(']');
+        out.Put(']');
     } else if constexpr (IsStringMap<T>::value) {
         JsonObjectWriter object(out);
         for (const auto& entry : value) object.Field(entry.first, entry.second);

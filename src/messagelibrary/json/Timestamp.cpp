@@ -3,6 +3,8 @@
 #include <boost/date_time/gregorian/gregorian_types.hpp>
 #include <cstring>
 #include <limits>
+#include <string>
+#include <string_view>
 
 #include "messagelibrary/json/CivilDate.h"
 
@@ -39,7 +41,7 @@ char* PutSeparated(char* at, char separator, int64_t value) {
 }
 
 // Parses a piece of decimal digits; an empty piece is 0.
-bool ParseDigits(const std::string& text, std::size_t from, std::size_t length, int64_t& value) {
+bool ParseDigits(std::string_view text, std::size_t from, std::size_t length, int64_t& value) {
     value = 0;
     if (from >= text.size()) return true;
     const std::size_t end = std::min(text.size(), from + length);
@@ -52,16 +54,25 @@ bool ParseDigits(const std::string& text, std::size_t from, std::size_t length, 
 }
 
 bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
-    std::string stripped;
-    stripped.reserve(length);
+    // The text without its separators, in place for any text a timestamp
+    // can be; longer ones take the heap.
+    char local[64];
+    std::string longer;
+    char* kept = local;
+    if (length > sizeof(local)) {
+        longer.resize(length);
+        kept = longer.data();
+    }
+    std::size_t size = 0;
     for (std::size_t i = 0; i < length; ++i) {
         const char c = text[i];
-        if (c != ':' && c != '-' && c != 'Z') stripped.push_back(c);
+        if (c != ':' && c != '-' && c != 'Z') kept[size++] = c;
     }
+    const std::string_view stripped(kept, size);
     const auto t = stripped.find('T');
-    if (t == std::string::npos) return false;
-    const std::string datePart = stripped.substr(0, t);
-    const std::string timePart = stripped.substr(t + 1);
+    if (t == std::string_view::npos) return false;
+    const std::string_view datePart = stripped.substr(0, t);
+    const std::string_view timePart = stripped.substr(t + 1);
     if (timePart.empty()) return false;
 
     int64_t year = 0, month = 0, day = 0;
@@ -82,7 +93,7 @@ bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
     }
     // The last piece: up to 7 characters, the first meant to be the ".".
     if (timePart.size() > 7) {
-        const std::string digits = timePart.substr(7, 6);
+        const std::string_view digits = timePart.substr(7, 6);
         if (!ParseDigits(digits, 0, digits.size(), fraction)) return false;
         for (std::size_t n = digits.size(); n < 6; ++n) fraction *= 10;
     }
@@ -145,15 +156,16 @@ Timestamp TimestampFromUnixSeconds(int64_t seconds) {
     return TimestampFromTicks(ticks);
 }
 
-void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
+char* WriteTimestampText(const Timestamp& timestamp, char* out) {
+    const auto put = [out](const char* text) {
+        const std::size_t size = std::strlen(text);
+        std::memcpy(out, text, size);
+        return out + size;
+    };
     if (timestamp.is_not_a_date_time() || timestamp.is_neg_infinity()) {
-        out += "0001-01-01T00:00:00";
-        return;
+        return put("0001-01-01T00:00:00");
     }
-    if (timestamp.is_pos_infinity()) {
-        out += "9999-12-31T23:59:59.9999999";
-        return;
-    }
+    if (timestamp.is_pos_infinity()) return put("9999-12-31T23:59:59.9999999");
     const int64_t micros = MicrosecondsSinceUnixEpoch(timestamp);
     int64_t days = micros / kMicrosPerDay;
     int64_t rest = micros % kMicrosPerDay;
@@ -165,9 +177,8 @@ void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
     const int64_t secondsOfDay = rest / kMicrosPerSecond;
     const int64_t fraction = rest % kMicrosPerSecond;
 
-    // Built in place, then appended at once: "YYYY-MM-DDThh:mm:ss[.ffffff]Z".
-    char text[32];
-    char* at = PutDigits(text, date.year, 4);
+    // "YYYY-MM-DDThh:mm:ss[.ffffff]Z"
+    char* at = PutDigits(out, date.year, 4);
     at = PutSeparated(at, '-', date.month);
     at = PutSeparated(at, '-', date.day);
     at = PutSeparated(at, 'T', secondsOfDay / 3600);
@@ -178,7 +189,12 @@ void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
         at = PutDigits(at, fraction, 6);
     }
     *at++ = 'Z';
-    out.append(text, at);
+    return at;
+}
+
+void AppendTimestampText(const Timestamp& timestamp, std::string& out) {
+    char text[kTimestampTextMax];
+    out.append(text, WriteTimestampText(timestamp, text));
 }
 
 std::string TimestampToText(const Timestamp& timestamp) {
@@ -188,7 +204,7 @@ std::string TimestampToText(const Timestamp& timestamp) {
     return text;
 }
 
-bool ParseTimestamp(const std::string& text, Timestamp& result) {
+bool ParseTimestamp(std::string_view text, Timestamp& result) {
     if (text == "0001-01-01T00:00:00" || text == "0001-01-01T00:00:00Z") {
         result = Timestamp(boost::posix_time::not_a_date_time);
         return true;

@@ -2,7 +2,9 @@
 
 #include <boost/date_time/posix_time/posix_time_types.hpp>
 #include <cstdint>
+#include <cstddef>
 #include <string>
+#include <string_view>
 
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
@@ -33,10 +35,15 @@ Timestamp TimestampFromUnixSeconds(int64_t seconds);
 std::string TimestampToText(const Timestamp& timestamp);
 // Appends the same text to out, for writers that build a body in place.
 void AppendTimestampText(const Timestamp& timestamp, std::string& out);
+// The most bytes that text takes.
+constexpr std::size_t kTimestampTextMax = 32;
+// Writes the same text at out, which has room for kTimestampTextMax bytes;
+// returns the end of what it wrote.
+char* WriteTimestampText(const Timestamp& timestamp, char* out);
 
 // Reads the text form. Returns false, leaving result unchanged, when refused;
 // a text whose hours roll beyond 9999-12-31 is refused too.
-bool ParseTimestamp(const std::string& text, Timestamp& result);
+bool ParseTimestamp(std::string_view text, Timestamp& result);
 // The same rules for a zero-terminated text, without the special-value
 // shortcut for "0001-01-01T00:00:00". Used for DATE_TIME tag values.
 bool ParseTimestampZ(const char* text, Timestamp& result);

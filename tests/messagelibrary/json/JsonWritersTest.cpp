@@ -18,9 +18,9 @@ using JsonTestTypes::Sample;
 
 template <typename T>
 std::string Text(const T& value) {
-    std::string out;
+    JsonOutput out;
     AppendJson(out, value);
-    return out;
+    return out.Take();
 }
 
 TEST(JsonWriters, Scalars) {
@@ -65,6 +65,19 @@ TEST(JsonWriters, StringEscaping) {
         {std::string("cut\0here", 8), R"("cut")"},
     };
     for (const Case& c : cases) EXPECT_EQ(Text(c.text), c.written) << c.text;
+    // Plain bytes go in pieces of eight: an escape or an end at every place
+    // of a piece and of the tail, and a text long enough to be measured first.
+    for (const std::size_t size : {1, 3, 4, 5, 7, 8, 9, 16, 17, 23, 5000}) {
+        for (std::size_t at = 0; at < size; at += size > 100 ? 997 : 1) {
+            std::string quoted(size, 'a'), cut(size, 'b');
+            quoted[at] = '"';
+            cut[at] = '\0';
+            EXPECT_EQ(Text(quoted), '"' + std::string(at, 'a') + "\\\"" +
+                                        std::string(size - at - 1, 'a') + '"')
+                << size << " " << at;
+            EXPECT_EQ(Text(cut), '"' + std::string(at, 'b') + '"') << size << " " << at;
+        }
+    }
 }
 
 TEST(JsonWriters, EscapeReturnsTheInputWhenNothingChanges) {
@@ -159,9 +172,9 @@ TEST(Base64, EncodesWithPaddingAndDecodesBack) {
         ASSERT_TRUE(Base64Decode(c.text, back)) << c.text;
         EXPECT_EQ(std::string(back.begin(), back.end()), c.bytes);
     }
-    std::string field;
+    JsonOutput field;
     AppendJsonBase64(field, "fo", 2);
-    EXPECT_EQ(field, R"("Zm8=")");
+    EXPECT_EQ(field.Take(), R"("Zm8=")");
     std::vector<uint8_t> out;
     for (const char* bad : {"Zg=", "Z===", "Zg=a", "Zm8=Zm8=", "Zm9*", "=Zm9"}) {
         EXPECT_FALSE(Base64Decode(bad, out)) << bad;
