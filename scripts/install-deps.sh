@@ -16,9 +16,11 @@ packages=(
   # cpack -G DEB: dpkg-shlibdeps, file, readelf; the package test: lintian
   dpkg-dev file binutils lintian
 )
-if [ "${1:-}" = "--with-broker" ]; then
-  packages+=(rabbitmq-server)
-fi
+# --with-cluster: the broker and haproxy, for the cluster tests.
+case "${1:-}" in
+  --with-broker) packages+=(rabbitmq-server) ;;
+  --with-cluster) packages+=(rabbitmq-server haproxy) ;;
+esac
 
 missing=()
 for p in "${packages[@]}"; do

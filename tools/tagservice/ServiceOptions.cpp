@@ -45,11 +45,21 @@ ServiceOptions ParseServiceOptions(const std::vector<std::string>& args) {
             options.serviceGuid = value();
         } else if (arg == "--durable-queue") {
             options.durableQueue = value();
+        } else if (arg == "--queue-type") {
+            options.queueType = value();
+            if (options.queueType != "classic" && options.queueType != "quorum") {
+                throw std::invalid_argument("--queue-type needs classic or quorum, not '" +
+                                            options.queueType + "'");
+            }
         } else if (arg == "--connect-timeout") {
             options.connectTimeoutMs = ParseTimeout(value());
         } else {
             throw std::invalid_argument("unknown argument '" + arg + "'");
         }
+    }
+    if (!options.queueType.empty() && options.durableQueue.empty()) {
+        throw std::invalid_argument("--queue-type needs --durable-queue NAME: only a durable "
+                                    "queue has a kind to choose");
     }
     return options;
 }
@@ -58,7 +68,7 @@ std::string UsageText() {
     return std::string(
                "Usage: kvveldra-tagservice [--config ID] [--store FILE] [--verbose]\n"
                "                           [--connect-timeout MS] [--service-guid GUID]\n"
-               "                           [--durable-queue NAME] [--help]\n"
+               "                           [--durable-queue NAME [--queue-type KIND]] [--help]\n"
                "\n"
                "Serves the TagInfo, TagCurrentValue and TagIngestion messages on the bus.\n"
                "\n"
@@ -78,6 +88,10 @@ std::string UsageText() {
                "                        keeps the requests sent while the service reconnects\n"
                "                        after a restart of the broker node; the default queue\n"
                "                        is deleted with its last consumer\n"
+               "  --queue-type KIND     the durable queue's kind: classic (the default) lives\n"
+               "                        on one node of a cluster and is refused while that\n"
+               "                        node is down; quorum is kept on a majority of the\n"
+               "                        nodes and goes on when any one of them is lost\n"
                "  --help                this text\n"
                "\n"
                "Once its consumers are started it prints the line\n"

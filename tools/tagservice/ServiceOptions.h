@@ -21,6 +21,10 @@ struct ServiceOptions {
     // which outlives the service and a restart of the broker node; empty: an
     // auto-deleted queue of a new name each run.
     std::string durableQueue;
+    // --queue-type classic|quorum: the kind of the durable queue; empty (or
+    // classic): the broker's default. A quorum queue is kept on a majority of
+    // a cluster's nodes and so outlives the loss of any one of them.
+    std::string queueType;
 };
 
 // The line printed on standard output once a managed service has registered.

@@ -25,12 +25,15 @@ constexpr const char* kServiceName = "TagService";
 // The subscriber of a durable queue: bound to its own name as an ordinary
 // service queue is, kept by the broker across restarts of the node, so that
 // requests sent while the service reconnects wait for it.
-MessageBus::MessageSubscriberBuilder DurableBuilder(const std::string& durableQueue) {
+MessageBus::MessageSubscriberBuilder DurableBuilder(const std::string& durableQueue,
+                                                    const std::string& queueType) {
     MessageBus::MessageSubscriberBuilder builder(
         MessageBus::ServiceQueueName(kServiceName, durableQueue));
     builder.BindAll = true;
     builder.AutoStart = false;
     builder.Durable = true;
+    // "classic" is what the broker declares without the argument.
+    if (queueType != "classic") builder.QueueType = queueType;
     return builder;
 }
 
@@ -53,10 +56,11 @@ MessageBus::MessageServiceSettings SettingsOn(MessageBus::AmqpConnectionManager&
 
 TagServiceEndpoint::TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager,
                                        TagServiceLogic& logic, bool verbose,
-                                       bool startConsuming, const std::string& durableQueue)
+                                       bool startConsuming, const std::string& durableQueue,
+                                       const std::string& queueType)
     : logic_(logic),
       verbose_(verbose),
-      service_(SettingsOn(manager, durableQueue, DurableBuilder(durableQueue))) {
+      service_(SettingsOn(manager, durableQueue, DurableBuilder(durableQueue, queueType))) {
     service_.SetTraceLogger(std::make_shared<ConsoleTraceLogger>());
     service_.SetDefaultResponseCallback(std::make_shared<MessageBus::Interfaces::FunctionBroadcastCallback>(
         [this](const Received& received) { Unhandled(received); }));

@@ -23,10 +23,11 @@ public:
     // consuming; throws when the broker cannot be reached. Without it the
     // queue fills until someone starts Subscriber(). With a durable queue
     // name the queue is "TagService_" + that name, durable and kept when the
-    // service ends.
+    // service ends, and of the kind queueType (empty: the broker's default).
     TagServiceEndpoint(MessageBus::AmqpConnectionManager& manager, TagServiceLogic& logic,
                        bool verbose, bool startConsuming = true,
-                       const std::string& durableQueue = std::string());
+                       const std::string& durableQueue = std::string(),
+                       const std::string& queueType = std::string());
     // Stops consuming, then closes the service's channels.
     ~TagServiceEndpoint();
     TagServiceEndpoint(const TagServiceEndpoint&) = delete;

@@ -98,7 +98,7 @@ int Run(const TagService::ServiceOptions& options) {
         statusLines = std::make_unique<TagService::StatusLinePump>(*manager);
         // The host starts the consumers when it goes live.
         endpoint = std::make_unique<TagService::TagServiceEndpoint>(
-            *manager, logic, options.verbose, false, options.durableQueue);
+            *manager, logic, options.verbose, false, options.durableQueue, options.queueType);
         host = std::make_unique<TagService::TagServiceHost>(
             &shutdownEvent, *endpoint,
             std::string(TagService::kReadyLine) + " (queue " + endpoint->QueueName() +

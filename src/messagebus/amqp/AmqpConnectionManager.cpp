@@ -137,9 +137,9 @@ void AmqpConnectionManager::Publish(const std::shared_ptr<AmqpChannel>& channel,
 
 void AmqpConnectionManager::DeclareQueue(const std::shared_ptr<AmqpChannel>& channel,
                                          const std::string& queueName, bool durable, bool exclusive,
-                                         bool autoDelete) {
+                                         bool autoDelete, const std::string& queueType) {
     const uint16_t id = IdOf(channel);
-    GetConsumerConnection()->DeclareQueue(id, queueName, durable, exclusive, autoDelete);
+    GetConsumerConnection()->DeclareQueue(id, queueName, durable, exclusive, autoDelete, queueType);
 }
 
 void AmqpConnectionManager::SetQos(const std::shared_ptr<AmqpChannel>& channel,

@@ -60,8 +60,10 @@ public:
 
     void Publish(const std::shared_ptr<AmqpChannel>& channel, const MessageHeaders& envelope,
                  const MessageBody& body, bool mandatory);
+    // A non-empty queueType goes with the declaration as x-queue-type.
     void DeclareQueue(const std::shared_ptr<AmqpChannel>& channel, const std::string& queueName,
-                      bool durable, bool exclusive, bool autoDelete);
+                      bool durable, bool exclusive, bool autoDelete,
+                      const std::string& queueType = std::string());
     void SetQos(const std::shared_ptr<AmqpChannel>& channel, uint32_t prefetchSize,
                 uint16_t prefetchCount, bool global);
     // Binds, and with `consume` starts a consumer on the queue, only when the

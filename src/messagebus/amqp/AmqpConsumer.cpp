@@ -32,6 +32,7 @@ AmqpConsumer::AmqpConsumer(const AmqpConsumerBuilder& builder)
     : QueueName(builder.QueueName),
       ConsumerName(builder.ConsumerName),
       Durable(builder.Durable),
+      QueueType(builder.QueueType),
       ManualAck(builder.ManualAck),
       ReceiveCallback(builder.ReceiveCallback),
       RawCallback(builder.RawCallback),
@@ -78,7 +79,7 @@ AmqpConsumer::~AmqpConsumer() {
 }
 
 void AmqpConsumer::DeclareQueue() {
-    Manager->DeclareQueue(Channel, QueueName, Durable, false, !Durable);
+    Manager->DeclareQueue(Channel, QueueName, Durable, false, !Durable, QueueType);
 }
 
 void AmqpConsumer::Bind(const std::vector<std::string>& keys) {

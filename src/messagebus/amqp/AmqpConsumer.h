@@ -89,6 +89,7 @@ private:
     std::string ExchangeName;
     const std::string ConsumerName;
     const bool Durable;
+    const std::string QueueType;
     const bool ManualAck;
     std::shared_ptr<AmqpChannel> Channel;
     const std::shared_ptr<Interfaces::IMessageSubscriberReceiveCallback> ReceiveCallback;

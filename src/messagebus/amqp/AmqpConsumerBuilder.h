@@ -24,6 +24,7 @@ struct AmqpConsumerBuilder {
     RawEnvelopeCallback RawCallback;
     std::shared_ptr<Interfaces::ITraceLogger> TraceLogger;
     bool Durable = false;
+    std::string QueueType;  // x-queue-type; empty: the broker's default
     bool ManualAck = false;
     uint16_t PrefetchCount = 100;
     // Null means the process singleton.

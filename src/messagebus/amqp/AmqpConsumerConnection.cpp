@@ -98,11 +98,19 @@ int32_t AmqpConsumerConnection::GetStartCount() {
 }
 
 void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string& queueName,
-                                          bool durable, bool exclusive, bool autoDelete) {
+                                          bool durable, bool exclusive, bool autoDelete,
+                                          const std::string& queueType) {
     const std::string context = "Error declaring queue. Channel ID: " + ChannelText(channelId) +
                                 ". Queue name: \"" + queueName + "\". Durable: " + Flag(durable) +
                                 ". Exclusive: " + Flag(exclusive) +
-                                ". Auto Delete: " + Flag(autoDelete) + ". ";
+                                ". Auto Delete: " + Flag(autoDelete) +
+                                (queueType.empty() ? "" : ". Queue type: " + queueType) + ". ";
+    amqp_table_entry_t typeEntry;
+    typeEntry.key = amqp_cstring_bytes("x-queue-type");
+    typeEntry.value.kind = AMQP_FIELD_KIND_UTF8;
+    typeEntry.value.value.bytes = TextBytes(queueType);
+    const amqp_table_t arguments =
+        queueType.empty() ? amqp_empty_table : amqp_table_t{1, &typeEntry};
     ControlGateGuard gate(Gate);
     RequireConnection(ErrorCodes::kDeclaringQueue, context);
     ReopenIfClosed(channelId);
@@ -111,7 +119,7 @@ void AmqpConsumerConnection::DeclareQueue(uint16_t channelId, const std::string&
         SocketWatchdog::Scope watch(Watchdog, Connection);
         declared =
             amqp_queue_declare(Connection, channelId, TextBytes(queueName), 0, durable ? 1 : 0,
-                               exclusive ? 1 : 0, autoDelete ? 1 : 0, amqp_empty_table);
+                               exclusive ? 1 : 0, autoDelete ? 1 : 0, arguments);
     }
     CheckChannelReply(channelId, ErrorCodes::kDeclaringQueue, context);
     if (declared == nullptr || declared->queue.len == 0) {

@@ -38,11 +38,13 @@ public:
     // Counts the stop, never below zero; at zero the threads end.
     void Stop();
 
-    // amqp_queue_declare, not passive, with no arguments. Throws AmqpException
+    // amqp_queue_declare, not passive, with no arguments but x-queue-type
+    // when queueType is not empty. Throws AmqpException
     // (Veldra.AMQPErrorDeclaringQueue), or Veldra.AMQPErrorObtainingQueueName
     // when the broker answers with an empty name.
     void DeclareQueue(uint16_t channelId, const std::string& queueName, bool durable,
-                      bool exclusive, bool autoDelete);
+                      bool exclusive, bool autoDelete,
+                      const std::string& queueType = std::string());
     // Binds the queue to the exchange with BindingKey(keys), then starts a
     // further basic.consume on it; returns the broker's consumer tag.
     std::string BindAndConsume(uint16_t channelId, const std::string& queueName,

@@ -54,6 +54,7 @@ MessageSubscriber::MessageSubscriber(const MessageSubscriberBuilder& builder)
                 std::make_shared<MessageSubscriberReceiveCallback>(this);
             consumerBuilder.TraceLogger = builder.TraceLogger;
             consumerBuilder.Durable = builder.Durable;
+            consumerBuilder.QueueType = builder.QueueType;
             consumerBuilder.ManualAck = builder.ManualAck;
             consumerBuilder.PrefetchCount = builder.PrefetchCount;
             consumerBuilder.ConnectionManager = connectionManager_;

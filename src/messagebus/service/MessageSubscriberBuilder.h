@@ -39,6 +39,9 @@ struct MessageSubscriberBuilder {
     // may grow.
     int32_t CallbackMaxAgeMs = 21600000;
     bool Durable = false;
+    // The queue's x-queue-type ("quorum" for a durable queue that lives on
+    // in a cluster when a node goes); empty: the broker's default.
+    std::string QueueType;
     bool ManualAck = false;
     std::shared_ptr<Interfaces::ITraceLogger> TraceLogger;
     // Receives what no other handler takes.

@@ -76,6 +76,13 @@ node_pids() {
         sed 's|^/proc/\([0-9]*\)/environ$|\1|' || true
 }
 
+# SIGTERM to the processes of DIR, then SIGKILL to those left; bounded.
+end_node_pids() {
+    local dir=$1
+    kill_node_pids "$dir" TERM 10 || kill_node_pids "$dir" KILL 5 ||
+        log "some processes of $dir would not die"
+}
+
 # Signals the node's processes and waits up to SECONDS for them to go.
 kill_node_pids() {
     local dir=$1 signal=$2 seconds=$3 pids i
@@ -132,6 +139,67 @@ EOF
     chmod 600 "$tls"/*.key
 }
 
+# The user and group the node runs as: "rabbitmq" when started by root.
+node_owner() {
+    if [ "$(id -u)" -eq 0 ]; then
+        id rabbitmq >/dev/null 2>&1 || die "user 'rabbitmq' does not exist"
+        echo "rabbitmq $(id -gn rabbitmq)"
+    else
+        echo "$(id -un) $(id -gn)"
+    fi
+}
+
+# DIR/rabbitmq.conf: AMQP on 127.0.0.1:AMQP and AMQP over TLS on
+# 127.0.0.1:AMQPS with the certificates in TLS_DIR.
+write_rabbitmq_conf() {
+    local dir=$1 amqp=$2 amqps=$3 tls=$4
+    cat >"$dir/rabbitmq.conf" <<EOF
+listeners.tcp.1 = 127.0.0.1:$amqp
+listeners.ssl.1 = 127.0.0.1:$amqps
+ssl_options.cacertfile = $tls/ca.pem
+ssl_options.certfile = $tls/server.pem
+ssl_options.keyfile = $tls/server.key
+ssl_options.verify = verify_none
+ssl_options.fail_if_no_peer_cert = false
+loopback_users = none
+disk_free_limit.absolute = 10MB
+log.console = false
+log.file.level = ${KVVELDRA_BROKER_LOG_LEVEL:-info}
+EOF
+}
+
+# DIR/node.env: the node's whole environment; the launcher and rabbitmqctl
+# both use it.
+write_node_env() {
+    local dir=$1 node=$2 dist=$3 epmd_port=$4
+    cat >"$dir/node.env" <<EOF
+KVVELDRA_BROKER_DIR=$dir
+HOME=$dir
+PATH=$CLEAN_PATH
+LC_ALL=C.UTF-8
+LANG=C.UTF-8
+RABBITMQ_NODENAME=$node
+RABBITMQ_USE_LONGNAME=false
+RABBITMQ_CONF_ENV_FILE=$dir/rabbitmq-env.conf
+RABBITMQ_CONFIG_FILE=$dir/rabbitmq.conf
+RABBITMQ_ADVANCED_CONFIG_FILE=$dir/advanced.config
+RABBITMQ_ENABLED_PLUGINS_FILE=$dir/enabled_plugins
+RABBITMQ_MNESIA_BASE=$dir/mnesia
+RABBITMQ_LOG_BASE=$dir/log
+RABBITMQ_LOGS=$dir/log/node.log
+RABBITMQ_PID_FILE=$dir/node.pid
+RABBITMQ_PLUGINS_EXPAND_DIR=$dir/plugins-expand
+RABBITMQ_FEATURE_FLAGS_FILE=$dir/feature_flags
+RABBITMQ_DIST_PORT=$dist
+ERL_EPMD_PORT=$epmd_port
+ERL_EPMD_ADDRESS=127.0.0.1
+RABBITMQ_SERVER_ADDITIONAL_ERL_ARGS="-kernel inet_dist_use_interface {127,0,0,1}"
+RABBITMQ_CTL_ERL_ARGS="-kernel inet_dist_use_interface {127,0,0,1}"
+RABBITMQ_CTL_DIST_PORT_MIN=0
+RABBITMQ_CTL_DIST_PORT_MAX=0
+EOF
+}
+
 # --- commands ---------------------------------------------------------------
 
 cmd_start() {
@@ -143,14 +211,7 @@ cmd_start() {
     cmd_stop "$envfile"
 
     local user group
-    if [ "$(id -u)" -eq 0 ]; then
-        id rabbitmq >/dev/null 2>&1 || die "user 'rabbitmq' does not exist"
-        user=rabbitmq
-        group=$(id -gn rabbitmq)
-    else
-        user=$(id -un)
-        group=$(id -gn)
-    fi
+    read -r user group <<<"$(node_owner)"
 
     local started=$SECONDS dir
     dir=$(mktemp -d "${TMPDIR:-/tmp}/kvveldra-broker.XXXXXX")
@@ -178,47 +239,8 @@ cmd_start() {
     ports=$(pick_ports 4)
     read -r amqp amqps dist epmd_port <<<"$ports"
 
-    cat >"$dir/rabbitmq.conf" <<EOF
-listeners.tcp.1 = 127.0.0.1:$amqp
-listeners.ssl.1 = 127.0.0.1:$amqps
-ssl_options.cacertfile = $dir/tls/ca.pem
-ssl_options.certfile = $dir/tls/server.pem
-ssl_options.keyfile = $dir/tls/server.key
-ssl_options.verify = verify_none
-ssl_options.fail_if_no_peer_cert = false
-loopback_users = none
-disk_free_limit.absolute = 10MB
-log.console = false
-log.file.level = ${KVVELDRA_BROKER_LOG_LEVEL:-info}
-EOF
-
-    # The node's whole environment; the launcher and rabbitmqctl both use it.
-    cat >"$dir/node.env" <<EOF
-KVVELDRA_BROKER_DIR=$dir
-HOME=$dir
-PATH=$CLEAN_PATH
-LC_ALL=C.UTF-8
-LANG=C.UTF-8
-RABBITMQ_NODENAME=$node
-RABBITMQ_USE_LONGNAME=false
-RABBITMQ_CONF_ENV_FILE=$dir/rabbitmq-env.conf
-RABBITMQ_CONFIG_FILE=$dir/rabbitmq.conf
-RABBITMQ_ADVANCED_CONFIG_FILE=$dir/advanced.config
-RABBITMQ_ENABLED_PLUGINS_FILE=$dir/enabled_plugins
-RABBITMQ_MNESIA_BASE=$dir/mnesia
-RABBITMQ_LOG_BASE=$dir/log
-RABBITMQ_LOGS=$dir/log/node.log
-RABBITMQ_PID_FILE=$dir/node.pid
-RABBITMQ_PLUGINS_EXPAND_DIR=$dir/plugins-expand
-RABBITMQ_FEATURE_FLAGS_FILE=$dir/feature_flags
-RABBITMQ_DIST_PORT=$dist
-ERL_EPMD_PORT=$epmd_port
-ERL_EPMD_ADDRESS=127.0.0.1
-RABBITMQ_SERVER_ADDITIONAL_ERL_ARGS="-kernel inet_dist_use_interface {127,0,0,1}"
-RABBITMQ_CTL_ERL_ARGS="-kernel inet_dist_use_interface {127,0,0,1}"
-RABBITMQ_CTL_DIST_PORT_MIN=0
-RABBITMQ_CTL_DIST_PORT_MAX=0
-EOF
+    write_rabbitmq_conf "$dir" "$amqp" "$amqps" "$dir/tls"
+    write_node_env "$dir" "$node" "$dist" "$epmd_port"
     make_launchers "$dir" "$user" "$group"
     chown -R "$user:$group" "$dir"
 
@@ -256,9 +278,21 @@ EOF
 # in sessions of their own, detached from our output, so that a caller
 # reading our output (ctest) is not kept waiting by them.
 launch_node() {
-    local dir=$1 epmd_port=$2 server
+    local dir=$1 epmd_port=$2
+    start_epmd "$dir" "$epmd_port"
+    launch_server "$dir"
+}
+
+# epmd on 127.0.0.1:PORT as a process of DIR.
+start_epmd() {
+    local dir=$1 epmd_port=$2
     setsid "$dir/bin/run" epmd -port "$epmd_port" -address 127.0.0.1 \
         </dev/null >>"$dir/log/epmd.log" 2>&1 9>&- &
+}
+
+# The node of DIR alone, on an epmd that runs already; waits until it runs.
+launch_server() {
+    local dir=$1 server
     setsid "$dir/bin/run" "$RABBITMQ_BIN/rabbitmq-server" \
         </dev/null >>"$dir/log/startup.log" 2>&1 9>&- &
     server=$!
@@ -337,19 +371,23 @@ stop_node_of() {
     if [ -n "$(node_pids "$dir")" ]; then
         timeout -k 5 "$STOP_TIMEOUT" "$dir/bin/rabbitmqctl" stop "$dir/node.pid" \
             >"$dir/log/stop.log" 2>&1 || log "rabbitmqctl stop failed; killing the node"
-        kill_node_pids "$dir" TERM 10 || kill_node_pids "$dir" KILL 5 ||
-            log "some processes of $dir would not die"
+        end_node_pids "$dir"
     fi
     rm -rf -- "$dir"
     rm -f -- "$file"
     log "stopped the node of $dir"
 }
 
-cmd_stop() {
-    local envfile=$1 file
+# Runs STOPPER FILE on ENV_FILE.starting and ENV_FILE, whichever exist.
+stop_env_files() {
+    local envfile=$1 stopper=$2 file
     for file in "$envfile.starting" "$envfile"; do
-        if [ -f "$file" ]; then stop_node_of "$file"; fi
+        if [ -f "$file" ]; then "$stopper" "$file"; fi
     done
+}
+
+cmd_stop() {
+    stop_env_files "$1" stop_node_of
 }
 
 cmd_env() {
@@ -413,4 +451,5 @@ main() {
     esac
 }
 
-main "$@"
+# Sourced (by cluster.sh) for its functions alone.
+if [ "${BASH_SOURCE[0]}" = "$0" ]; then main "$@"; fi

@@ -16,9 +16,10 @@ bool ParsePort(const std::string& text, int& port) {
     return port > 0 && port < 65536;
 }
 
-// Splits KEY='value' (or KEY=value) lines into a map.
-bool ParseLines(const std::string& text, std::map<std::string, std::string>& values,
-                std::string& error) {
+}  // namespace
+
+bool ParseEnvLines(const std::string& text, std::map<std::string, std::string>& values,
+                   std::string& error) {
     std::istringstream lines(text);
     std::string line;
     int number = 0;
@@ -41,11 +42,9 @@ bool ParseLines(const std::string& text, std::map<std::string, std::string>& val
     return true;
 }
 
-}  // namespace
-
 bool ParseBrokerSettings(const std::string& text, BrokerSettings& out, std::string& error) {
     std::map<std::string, std::string> values;
-    if (!ParseLines(text, values, error)) {
+    if (!ParseEnvLines(text, values, error)) {
         return false;
     }
     BrokerSettings settings;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <map>
 #include <string>
 
 namespace Korvane::Veldra::Testing {
@@ -21,6 +22,12 @@ struct BrokerSettings {
     std::string CtlPath;          // rabbitmqctl bound to this node and no other
     std::string LogPath;          // the node's log
 };
+
+// Splits the KEY='value' (or KEY=value) lines of an environment file into
+// values; blank lines and lines starting with '#' are skipped. False, with the
+// line in error, on a line without a key.
+bool ParseEnvLines(const std::string& text, std::map<std::string, std::string>& values,
+                   std::string& error);
 
 // Parses the KEY='value' lines of an environment file; blank lines and lines
 // starting with '#' are skipped, unknown keys ignored. False, with the reason

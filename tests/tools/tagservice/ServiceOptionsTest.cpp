@@ -16,13 +16,15 @@ TEST(ServiceOptionsTest, DefaultsAndEveryOption) {
 
     const ServiceOptions all = ParseServiceOptions(
         {"--config", "veldra_localhost", "--store", "/x/t.db", "--verbose", "--connect-timeout",
-         "2500", "--service-guid", "9d1e", "--help"});
+         "2500", "--service-guid", "9d1e", "--durable-queue", "q", "--queue-type", "quorum",
+         "--help"});
     EXPECT_EQ(all.configurationId, "veldra_localhost");
     EXPECT_EQ(all.storeFile, "/x/t.db");
     EXPECT_TRUE(all.verbose);
     EXPECT_TRUE(all.help);
     EXPECT_EQ(all.connectTimeoutMs, 2500);
     EXPECT_EQ(all.serviceGuid, "9d1e");
+    EXPECT_EQ(all.queueType, "quorum");
 }
 
 TEST(ServiceOptionsTest, BadArgumentsAreRefusedByName) {
@@ -32,6 +34,8 @@ TEST(ServiceOptionsTest, BadArgumentsAreRefusedByName) {
                                                {"--connect-timeout", "0"},
                                                {"--connect-timeout", "12x"},
                                                {"--service-guid"},
+                                               {"--queue-type", "lazy"},
+                                               {"--queue-type", "quorum"},
                                                {"--storage", "f"}}) {
         try {
             ParseServiceOptions(args);
