@@ -13,6 +13,8 @@ packages=(
   libsqlite3-dev
   # the Python module kvveldra and its tests
   pybind11-dev python3-dev python3-pytest
+  # the browser tests (kvtag serve's page in headless Chromium)
+  chromium chromium-driver python3-selenium
   # cpack -G DEB: dpkg-shlibdeps, file, readelf; the package test: lintian
   dpkg-dev file binutils lintian
 )

@@ -16,15 +16,16 @@ struct CommandEntry {
     const char* name;
 };
 
-constexpr std::array<CommandEntry, 9> kCommands = {{{Command::Help, "help"},
-                                                    {Command::List, "list"},
-                                                    {Command::Read, "read"},
-                                                    {Command::Write, "write"},
-                                                    {Command::Create, "create"},
-                                                    {Command::Keywords, "keywords"},
-                                                    {Command::Properties, "properties"},
-                                                    {Command::Aggregates, "aggregates"},
-                                                    {Command::Delete, "delete"}}};
+constexpr std::array<CommandEntry, 10> kCommands = {{{Command::Help, "help"},
+                                                     {Command::List, "list"},
+                                                     {Command::Read, "read"},
+                                                     {Command::Write, "write"},
+                                                     {Command::Create, "create"},
+                                                     {Command::Keywords, "keywords"},
+                                                     {Command::Properties, "properties"},
+                                                     {Command::Aggregates, "aggregates"},
+                                                     {Command::Delete, "delete"},
+                                                     {Command::Serve, "serve"}}};
 
 // An option as written: its name without the dashes and its value, if any.
 struct RawOption {
@@ -35,7 +36,7 @@ struct RawOption {
 bool TakesValue(const std::string& name) {
     return name == "config" || name == "timeout" || name == "skip" || name == "take" ||
            name == "keyword" || name == "property" || name == "type" || name == "time" ||
-           name == "collect";
+           name == "collect" || name == "listen" || name == "instance";
 }
 
 bool IsGlobal(const std::string& name) {
@@ -57,21 +58,21 @@ bool Allowed(Command command, const std::string& name) {
             return name == "set";
         case Command::Aggregates:
             return name == "collect" || name == "reset";
+        case Command::Serve:
+            return name == "listen" || name == "instance" || name == "allow-write";
         default:
             return false;
     }
 }
 
 uint32_t ParseCount(const std::string& option, const std::string& text, Command command) {
-    bool digits = !text.empty() && text.size() <= 10;
-    for (const char c : text) digits = digits && c >= '0' && c <= '9';
-    const unsigned long long value = digits ? std::strtoull(text.c_str(), nullptr, 10) : 0;
-    if (!digits || value > UINT32_MAX) {
+    const auto value = ParseUint32(text);
+    if (!value) {
         throw UsageError(
             "--" + option + " needs a whole number from 0 to 4294967295, not '" + text + "'",
             command);
     }
-    return static_cast<uint32_t>(value);
+    return *value;
 }
 
 std::pair<std::string, std::string> ParseProperty(const std::string& text, Command command) {
@@ -81,6 +82,27 @@ std::pair<std::string, std::string> ParseProperty(const std::string& text, Comma
                          command);
     }
     return {text.substr(0, equals), text.substr(equals + 1)};
+}
+
+// HOST:PORT, with an IPv6 host in brackets ([::1]:8080); the port 0..65535.
+void ParseListen(Invocation& call, const std::string& text) {
+    const auto colon = text.rfind(':');
+    std::string host = colon == std::string::npos ? "" : text.substr(0, colon);
+    const std::string port = colon == std::string::npos ? "" : text.substr(colon + 1);
+    if (host.size() > 2 && host.front() == '[' && host.back() == ']') {
+        host = host.substr(1, host.size() - 2);
+    }
+    bool digits = !port.empty() && port.size() <= 5;
+    for (const char c : port) digits = digits && c >= '0' && c <= '9';
+    if (host.empty() || !digits || std::strtoul(port.c_str(), nullptr, 10) > 65535) {
+        throw UsageError(
+            "--listen needs HOST:PORT with a port from 0 to 65535, such as "
+            "127.0.0.1:8080, not '" +
+                text + "'",
+            call.command);
+    }
+    call.listenHost = host;
+    call.listenPort = static_cast<uint16_t>(std::strtoul(port.c_str(), nullptr, 10));
 }
 
 void RequirePath(const std::string& path, Command command) {
@@ -156,6 +178,17 @@ void Apply(Invocation& call, const RawOption& option, bool& help) {
         call.collect = value == "on";
     } else if (name == "reset") {
         call.reset = true;
+    } else if (name == "listen") {
+        ParseListen(call, value);
+    } else if (name == "instance") {
+        once(call.instance.has_value());
+        call.instance = ParseCount(name, value, command);
+        if (*call.instance == 0) {
+            throw UsageError("--instance needs 1 or more; 0 is the library's default instance",
+                             command);
+        }
+    } else if (name == "allow-write") {
+        call.allowWrite = true;
     }
 }
 
@@ -231,6 +264,9 @@ void ApplyWords(Invocation& call, const std::vector<std::string>& words) {
             RequirePath(words[0], command);
             call.paths = words;
             return;
+        case Command::Serve:
+            RequireCount(words, 0, command, "no PATH or PATTERN");
+            return;
     }
 }
 
@@ -256,6 +292,15 @@ std::optional<std::string> TagPathProblem(const std::string& path) {
         return "a tag path may not hold '*' (use list for patterns): '" + path + "'";
     }
     return std::nullopt;
+}
+
+std::optional<uint32_t> ParseUint32(std::string_view text) {
+    bool digits = !text.empty() && text.size() <= 10;
+    for (const char c : text) digits = digits && c >= '0' && c <= '9';
+    if (!digits) return std::nullopt;
+    const unsigned long long value = std::strtoull(std::string(text).c_str(), nullptr, 10);
+    if (value > UINT32_MAX) return std::nullopt;
+    return static_cast<uint32_t>(value);
 }
 
 bool WantsJson(const std::vector<std::string>& args) {
@@ -319,7 +364,8 @@ Invocation ParseCommandLine(const std::vector<std::string>& args) {
     for (const auto& option : options) {
         if (!Allowed(call.command, option.name)) {
             const bool known = TakesValue(option.name) || option.name == "stdin" ||
-                               option.name == "set" || option.name == "reset";
+                               option.name == "set" || option.name == "reset" ||
+                               option.name == "allow-write";
             const std::optional<Command> where =
                 haveCommand ? std::optional<Command>(call.command) : std::nullopt;
             throw UsageError(known ? "--" + option.name + " is not an option of " +

@@ -12,7 +12,18 @@
 
 namespace kvtag {
 
-enum class Command { Help, List, Read, Write, Create, Keywords, Properties, Aggregates, Delete };
+enum class Command {
+    Help,
+    List,
+    Read,
+    Write,
+    Create,
+    Keywords,
+    Properties,
+    Aggregates,
+    Delete,
+    Serve
+};
 
 // The subcommand of a name ("list", "read", ...); nothing for other names.
 std::optional<Command> CommandByName(std::string_view name);
@@ -51,6 +62,11 @@ struct Invocation {
     bool set = false;             // keywords, properties --set
     std::optional<bool> collect;  // aggregates --collect on|off
     bool reset = false;           // aggregates --reset
+
+    std::string listenHost = "127.0.0.1";  // serve --listen HOST:PORT
+    uint16_t listenPort = 8080;            // 0: any free port
+    std::optional<uint64_t> instance;      // serve --instance N (1 or more)
+    bool allowWrite = false;               // serve --allow-write
 };
 
 // A command line that cannot be run: the message, and the subcommand whose
@@ -74,6 +90,10 @@ Invocation ParseCommandLine(const std::vector<std::string>& args);
 // True when the arguments ask for JSON output, so that even a usage error
 // is answered in JSON.
 bool WantsJson(const std::vector<std::string>& args);
+
+// A whole number of decimal digits from 0 to 4294967295; nothing for any
+// other text.
+std::optional<uint32_t> ParseUint32(std::string_view text);
 
 // Why a text cannot be the exact path of one tag, or nothing when it can.
 std::optional<std::string> TagPathProblem(const std::string& path);

@@ -172,6 +172,8 @@ std::vector<TagConsoleValue> InRequestOrder(const std::vector<FoundTag>& tags,
     return ordered;
 }
 
+}  // namespace
+
 std::vector<TagConsoleValue> ReadValues(const ConsoleInstance& instance,
                                         const std::vector<FoundTag>& tags) {
     const auto references = References(tags);
@@ -182,6 +184,8 @@ std::vector<TagConsoleValue> ReadValues(const ConsoleInstance& instance,
     });
     return InRequestOrder(tags, std::move(values));
 }
+
+namespace {
 
 Rendered Keywords(const Invocation& call, const ConsoleInstance& instance, OpenedTags& opened) {
     const FoundTag tag = RequireTag(instance, call.paths.front(), opened);
@@ -299,6 +303,7 @@ Rendered RunCommand(const Invocation& call, const ConsoleInstance& instance,
         case Command::Delete:
             return Delete(call, instance, opened);
         case Command::Help:
+        case Command::Serve:
             break;
     }
     return {};

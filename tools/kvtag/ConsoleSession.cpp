@@ -39,8 +39,8 @@ Reservation::~Reservation() {
     TagConsoleUnreserve(&reserved_);
 }
 
-ConsoleInstance::ConsoleInstance(const GlobalOptions& options)
-    : verbose_(options.verbose), config_(options.config) {
+ConsoleInstance::ConsoleInstance(const GlobalOptions& options, uint64_t instanceId)
+    : id_(instanceId), verbose_(options.verbose), config_(options.config) {
     const uint32_t timeoutMs = options.timeoutMs.value_or(kDefaultTimeoutMs);
     // A configuration named on the command line is that one or none.
     const bool allowFallback = !options.config.has_value();

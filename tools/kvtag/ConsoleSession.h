@@ -35,8 +35,13 @@ public:
     // How long the library itself waits for each answer of the tag service.
     static constexpr uint32_t kLibraryRequestTimeoutMs = 10000;
 
+    // The instance id when none is given. Not 0: the library's default
+    // instance ignores the configuration and time-out.
+    static constexpr uint64_t kDefaultInstanceId = 1;
+
     // Throws LibraryError, with what kvtag finds behind the library's status.
-    explicit ConsoleInstance(const GlobalOptions& options);
+    explicit ConsoleInstance(const GlobalOptions& options,
+                             uint64_t instanceId = kDefaultInstanceId);
     ~ConsoleInstance();
     ConsoleInstance(const ConsoleInstance&) = delete;
     ConsoleInstance& operator=(const ConsoleInstance&) = delete;
@@ -51,9 +56,7 @@ public:
                  const std::function<int32_t(std::string& error)>& call) const;
 
 private:
-    // Not 0: the default instance ignores the configuration and time-out.
-    static constexpr uint64_t kInstanceId = 1;
-    uint64_t id_ = kInstanceId;
+    uint64_t id_;
     bool verbose_ = false;
     std::optional<std::string> config_;
 };

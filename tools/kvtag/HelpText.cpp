@@ -34,6 +34,7 @@ constexpr const char* kTool =
     "  properties PATH   show or replace the properties of a tag\n"
     "  aggregates PATH   show, switch or reset the aggregates of a tag\n"
     "  delete PATH...    delete tags\n"
+    "  serve             serve a live page of tags over HTTP\n"
     "  help [COMMAND]    show help of a command ('kvtag COMMAND --help' too)\n"
     "\n";
 
@@ -107,6 +108,20 @@ const char* CommandHelp(Command command) {
             return "Usage: kvtag delete PATH...\n"
                    "\n"
                    "Deletes the tags. All must exist; else nothing is deleted.\n";
+        case Command::Serve:
+            return "Usage: kvtag serve [--listen HOST:PORT] [--instance N] [--allow-write]\n"
+                   "\n"
+                   "Serves a page of tags over HTTP until interrupted: a search by the\n"
+                   "patterns of list, the current values and aggregates refreshed once a\n"
+                   "second, and a plot of the last 10 minutes of the tags selected. The page\n"
+                   "reads the JSON API under /api/ (list, read, trend, write).\n"
+                   "  --listen HOST:PORT  the address to listen on (default 127.0.0.1:8080;\n"
+                   "                      port 0: any free port); anything but loopback lets\n"
+                   "                      other machines read the tags\n"
+                   "  --instance N        the console instance id to use (default 1)\n"
+                   "  --allow-write       let the page write values (POST /api/write, with\n"
+                   "                      the token the page carries); read-only without it\n"
+                   "Once listening it prints 'kvtag serve: listening on http://HOST:PORT/'.\n";
         case Command::Help:
             return "Usage: kvtag help [COMMAND]\n";
     }

@@ -58,15 +58,17 @@ private:
         ++pos_;
     }
 
-    // A value; the members of an object at depth 0 go to `members`.
-    JsonScalar Value(int depth, std::vector<std::pair<std::string, JsonScalar>>* members) {
+    // A value; the members of an object at depth 0 go to `members`, and
+    // with `keepItems` the items of an array into the value.
+    JsonScalar Value(int depth, std::vector<std::pair<std::string, JsonScalar>>* members,
+                     bool keepItems = false) {
         Blanks();
         JsonScalar value;
         const char c = Peek();
         if (c == '{' || c == '[') {
             if (depth >= kMaxDepth) Fail("nested too deep");
             value.kind = c == '{' ? JsonKind::Object : JsonKind::Array;
-            Container(c == '{', depth, members);
+            Container(c == '{', depth, members, keepItems ? &value.items : nullptr);
         } else if (c == '"') {
             value.kind = JsonKind::String;
             value.text = String();
@@ -92,8 +94,8 @@ private:
         return true;
     }
 
-    void Container(bool object, int depth,
-                   std::vector<std::pair<std::string, JsonScalar>>* members) {
+    void Container(bool object, int depth, std::vector<std::pair<std::string, JsonScalar>>* members,
+                   std::vector<JsonScalar>* items) {
         const char close = object ? '}' : ']';
         const char* separator = object ? "',' or '}'" : "',' or ']'";
         ++pos_;
@@ -108,10 +110,11 @@ private:
                 if (Peek() != '"') Fail("expected a key in double quotes");
                 std::string key = String();
                 Expect(':', "':' after the key");
-                JsonScalar member = Value(depth + 1, nullptr);
+                JsonScalar member = Value(depth + 1, nullptr, members != nullptr);
                 if (members != nullptr) members->emplace_back(std::move(key), std::move(member));
             } else {
-                Value(depth + 1, nullptr);
+                JsonScalar item = Value(depth + 1, nullptr);
+                if (items != nullptr) items->push_back(std::move(item));
             }
             Blanks();
             if (Peek() == close) break;

@@ -11,13 +11,17 @@ namespace kvtag {
 // kvtag's own small reader of a configuration file: it checks the JSON
 // syntax, to say where a file that the library could not parse goes wrong,
 // and keeps the members of the top-level object, to tell which key the
-// library refused. It builds no tree.
+// library refused, and the items of a member that is an array (for the
+// small request bodies of kvtag serve). It builds no deeper tree.
 enum class JsonKind { Null, Bool, Number, String, Array, Object };
 
 struct JsonScalar {
     JsonKind kind = JsonKind::Null;
     std::string text;    // a string's characters (escapes resolved), a number as written
     bool truth = false;  // a boolean's value
+    // A top-level member's array items; an item that is itself a container
+    // keeps its kind only.
+    std::vector<JsonScalar> items;
 };
 
 struct JsonDocument {

@@ -15,6 +15,7 @@
 #include "HelpText.h"
 #include "OutputChannel.h"
 #include "Report.h"
+#include "ServeCommand.h"
 #include "StdinLines.h"
 
 namespace {
@@ -87,6 +88,7 @@ int main(int argc, char** argv) {
             std::fputs(kvtag::HelpText(call.helpTopic).c_str(), stdout);
             return 0;
         }
+        if (call.command == kvtag::Command::Serve) return kvtag::RunServe(call);
         std::vector<kvtag::TagBatch> batches;
         if (call.command == kvtag::Command::Write && call.fromStdin) {
             try {
