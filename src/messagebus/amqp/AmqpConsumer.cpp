@@ -299,8 +299,12 @@ void AmqpConsumer::LogReceived(const GenericMessage& message) {
 }
 
 bool AmqpConsumer::TakeOnReader(const amqp_envelope_t& envelope) {
+    if (!ReceiveCallback->TakesAnyOnReader()) return false;
     const std::string correlationId = CorrelationIdOf(envelope);
-    if (correlationId.empty() || !ReceiveCallback->MayTakeOnReader(correlationId)) return false;
+    if (correlationId.empty() ||
+        !ReceiveCallback->MayTakeOnReader(correlationId, MessageTypeOf(envelope))) {
+        return false;
+    }
     std::shared_ptr<GenericMessage> message;
     try {
         message = MessageFromEnvelope(envelope, ConsumerTag);

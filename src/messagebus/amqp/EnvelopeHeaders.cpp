@@ -23,6 +23,14 @@ std::string CorrelationIdOf(const amqp_envelope_t& envelope) {
     return correlationId.substr(0, correlationId.find('\0'));
 }
 
+std::string MessageTypeOf(const amqp_envelope_t& envelope) {
+    const amqp_basic_properties_t& properties = envelope.message.properties;
+    if ((properties._flags & AMQP_BASIC_TYPE_FLAG) == 0 || properties.type.bytes == nullptr) {
+        return std::string();
+    }
+    return BytesText(properties.type);
+}
+
 std::shared_ptr<GenericMessage> MessageFromEnvelope(const amqp_envelope_t& envelope,
                                                     const std::string& consumerTag) {
     const amqp_bytes_t& body = envelope.message.body;

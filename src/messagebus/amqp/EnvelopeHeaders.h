@@ -17,8 +17,10 @@ namespace Korvane::Veldra::MessageBus {
 // the envelope, which win over table entries of the same keys.
 MessageHeaders HeadersFromEnvelope(const amqp_envelope_t& envelope, const std::string& consumerTag);
 
-// The correlation id the headers would have: empty without one.
+// The correlation id and the message type the headers would have: empty
+// without them.
 std::string CorrelationIdOf(const amqp_envelope_t& envelope);
+std::string MessageTypeOf(const amqp_envelope_t& envelope);
 
 // The received message: those headers and a copy of the body, so that it
 // outlives the envelope.

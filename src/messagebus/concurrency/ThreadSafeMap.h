@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <cstddef>
 #include <map>
 #include <mutex>
@@ -23,13 +24,17 @@ public:
     // False, and nothing changed, when the key exists.
     bool Insert(const K& key, V value) {
         std::lock_guard<std::mutex> lock(mutex_);
-        return map_.emplace(key, std::move(value)).second;
+        const bool inserted = map_.emplace(key, std::move(value)).second;
+        size_.store(map_.size(), std::memory_order_relaxed);
+        return inserted;
     }
 
     // Inserts or replaces; true when the key was new.
     bool InsertOrAssign(const K& key, V value) {
         std::lock_guard<std::mutex> lock(mutex_);
-        return map_.insert_or_assign(key, std::move(value)).second;
+        const bool inserted = map_.insert_or_assign(key, std::move(value)).second;
+        size_.store(map_.size(), std::memory_order_relaxed);
+        return inserted;
     }
 
     bool TryGet(const K& key, V& out) const {
@@ -47,6 +52,7 @@ public:
         if (found == map_.end()) return false;
         out = std::move(found->second);
         map_.erase(found);
+        size_.store(map_.size(), std::memory_order_relaxed);
         return true;
     }
 
@@ -58,11 +64,14 @@ public:
         if (found == map_.end() || !shouldTake(static_cast<const V&>(found->second))) return false;
         out = std::move(found->second);
         map_.erase(found);
+        size_.store(map_.size(), std::memory_order_relaxed);
         return true;
     }
     bool Erase(const K& key) {
         std::lock_guard<std::mutex> lock(mutex_);
-        return map_.erase(key) != 0;
+        const bool erased = map_.erase(key) != 0;
+        size_.store(map_.size(), std::memory_order_relaxed);
+        return erased;
     }
 
     // Erases the entry when it exists and shouldErase(value) is true.
@@ -74,6 +83,7 @@ public:
             return false;
         }
         map_.erase(found);
+        size_.store(map_.size(), std::memory_order_relaxed);
         return true;
     }
 
@@ -91,6 +101,7 @@ public:
                 ++entry;
             }
         }
+        size_.store(map_.size(), std::memory_order_relaxed);
         return erased;
     }
 
@@ -108,9 +119,14 @@ public:
         return map_.size();
     }
 
+    // Without the lock: whether the map was empty a moment ago. For a quick
+    // look before the locked one, where a stale answer does no harm.
+    bool SeemsEmpty() const { return size_.load(std::memory_order_relaxed) == 0; }
+
 private:
     mutable std::mutex mutex_;
     std::map<K, V> map_;
+    std::atomic<std::size_t> size_{0};  // map_.size() as of the last change
 };
 
 }  // namespace Korvane::Veldra::MessageBus

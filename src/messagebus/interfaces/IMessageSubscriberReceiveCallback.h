@@ -16,11 +16,15 @@ public:
     virtual void PublishFailed(const ResetEvent& event) = 0;
 
     // ---- On the connection's reader thread ----
-    // True when a reply with this correlation id may have a taker that the
-    // reader can serve itself: a caller waiting for it, or a response
-    // callback that only completes a request.
-    virtual bool MayTakeOnReader(const std::string& correlationId) {
+    // A look without locks before each delivery: false when no reply can
+    // have a taker on the reader now, so the reader looks no further.
+    virtual bool TakesAnyOnReader() { return false; }
+    // True when a reply with this correlation id and message type may have a
+    // taker that the reader can serve itself: a caller waiting for it, or a
+    // response callback that only completes a request.
+    virtual bool MayTakeOnReader(const std::string& correlationId, const std::string& messageType) {
         (void)correlationId;
+        (void)messageType;
         return false;
     }
     // Hands the message to such a taker; false when it has none (then the

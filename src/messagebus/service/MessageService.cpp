@@ -315,6 +315,8 @@ void MessageService::RegisterResponseCallback(const std::string& messageName,
                                               Interfaces::IResponseCallback* callback) {
     if (!responseCallbacks_->Insert(messageName, callback)) {
         LogError("Failed to add register message name callback | " + messageName);
+    } else if (callback != nullptr && callback->RunsOnReader(messageName)) {
+        subscriber_->AllowCallbacksOnReader();
     }
 }
 

@@ -227,11 +227,19 @@ std::shared_ptr<ResponseWaiter> MessageSubscriber::AwaitingCaller(
     return synch.Waiter;
 }
 
-bool MessageSubscriber::MayTakeOnReader(const std::string& correlationId) const {
+bool MessageSubscriber::TakesAnyOnReader() const {
+    return !synchCallbacks_->SeemsEmpty() || callbacksOnReader_.load(std::memory_order_relaxed);
+}
+
+bool MessageSubscriber::MayTakeOnReader(const std::string& correlationId,
+                                        const std::string& messageType) const {
     SynchCallbackInfo synch;
+    if (synchCallbacks_->TryGet(correlationId, synch) && synch.Waiter) return true;
+    // A callback that would run on the handling thread anyway is not worth
+    // building the message for twice.
     CorrIdCallbackInfo byCorrelation;
-    return (synchCallbacks_->TryGet(correlationId, synch) && synch.Waiter) ||
-           corrIdCallbacks_->TryGet(correlationId, byCorrelation);
+    return corrIdCallbacks_->TryGet(correlationId, byCorrelation) && byCorrelation.Callback &&
+           byCorrelation.Callback->RunsOnReader(messageType);
 }
 
 bool MessageSubscriber::TakeOnReader(const std::shared_ptr<GenericMessage>& message) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <cstdint>
 #include <memory>
 #include <mutex>
@@ -83,7 +84,12 @@ public:
     // is taken there, without waking the handling thread. MayTakeOnReader is
     // the cheap look before the message is built; TakeOnReader hands it over
     // and is false when no such taker is left.
-    bool MayTakeOnReader(const std::string& correlationId) const;
+    bool TakesAnyOnReader() const;
+    bool MayTakeOnReader(const std::string& correlationId, const std::string& messageType) const;
+    // From now on a correlation callback may say it runs on the reader
+    // (IResponseCallback::RunsOnReader); until then the reader asks only for
+    // synchronous callers.
+    void AllowCallbacksOnReader() { callbacksOnReader_.store(true, std::memory_order_relaxed); }
     bool TakeOnReader(const std::shared_ptr<GenericMessage>& message);
 
     // ---- The callback maps, for the message service ----
@@ -124,6 +130,7 @@ private:
     PurgeSchedule lastExpiry_;
     const int32_t callbackMaxAgeMs_;
     const std::shared_ptr<Interfaces::IBroadcastCallback> defaultCallback_;
+    std::atomic<bool> callbacksOnReader_{false};
 
     // Guards traceLogger_ and unhandledPoint_.
     std::mutex loggerMutex_;

@@ -10,8 +10,13 @@ void MessageSubscriberReceiveCallback::MessageReceived(std::shared_ptr<GenericMe
     Subscriber->MessageReceived(std::move(message));
 }
 
-bool MessageSubscriberReceiveCallback::MayTakeOnReader(const std::string& correlationId) {
-    return Subscriber->MayTakeOnReader(correlationId);
+bool MessageSubscriberReceiveCallback::TakesAnyOnReader() {
+    return Subscriber->TakesAnyOnReader();
+}
+
+bool MessageSubscriberReceiveCallback::MayTakeOnReader(const std::string& correlationId,
+                                                       const std::string& messageType) {
+    return Subscriber->MayTakeOnReader(correlationId, messageType);
 }
 
 bool MessageSubscriberReceiveCallback::TakeOnReader(const std::shared_ptr<GenericMessage>& message) {

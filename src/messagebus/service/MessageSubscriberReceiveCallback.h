@@ -18,7 +18,9 @@ public:
 
     void MessageReceived(std::shared_ptr<GenericMessage> message) override;
     void PublishFailed(const ResetEvent& event) override;
-    bool MayTakeOnReader(const std::string& correlationId) override;
+    bool TakesAnyOnReader() override;
+    bool MayTakeOnReader(const std::string& correlationId,
+                         const std::string& messageType) override;
     bool TakeOnReader(const std::shared_ptr<GenericMessage>& message) override;
 
 private:
