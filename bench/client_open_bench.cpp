@@ -21,6 +21,7 @@
 #include "support/TagServiceProcess.h"
 #include "taglibrary/Client.h"
 #include "taglibrary/requests/ConsoleAsyncRequest.h"
+#include "support/TimedCalls.h"
 
 namespace {
 
@@ -81,10 +82,7 @@ void BM_OpenExistingTag(benchmark::State& state) {
             std::chrono::duration<double, std::micro>(std::chrono::steady_clock::now() - start)
                 .count());
     }
-    if (micros.empty()) return;
-    std::sort(micros.begin(), micros.end());
-    state.counters["p50_us"] = micros[micros.size() / 2];
-    state.counters["p99_us"] = micros[std::min(micros.size() - 1, micros.size() * 99 / 100)];
+    Korvane::Veldra::Bench::PutLatencies(state, micros);
     std::filesystem::remove_all(root);
 }
 

@@ -56,21 +56,6 @@ inline __attribute__((always_inline)) bool AllPlain(uint64_t bytes) noexcept {
 
 }  // namespace
 
-std::size_t JsonPlainPrefix(std::string_view text) noexcept {
-    const char* data = text.data();
-    const std::size_t size = text.size();
-    std::size_t i = 0;
-    for (; i + 8 <= size; i += 8) {
-        uint64_t bytes;
-        std::memcpy(&bytes, data + i, sizeof(bytes));
-        if (!AllPlain(bytes)) break;
-    }
-    for (; i < size; ++i) {
-        if (data[i] == '\0' || Escape(data[i]) != 0) break;
-    }
-    return i;
-}
-
 std::size_t JsonEscapedLength(std::string_view text) noexcept {
     std::size_t length = 0;
     for (const char c : text) {

@@ -11,10 +11,6 @@
 //   everything else         as it stands (UTF-8 included; "/" is not escaped)
 namespace Korvane::Veldra::VeldraMessageLibrary {
 
-// How many bytes at the start of text stand as they are in the escaped form:
-// the position of the first byte that needs an escape or is zero, else the
-// text's length. Eight bytes are checked at a time.
-std::size_t JsonPlainPrefix(std::string_view text) noexcept;
 // The length of the escaped form, without quotes.
 std::size_t JsonEscapedLength(std::string_view text) noexcept;
 // Writes the escaped form to out, which has room for JsonEscapedLength;
