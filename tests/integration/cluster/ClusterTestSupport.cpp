@@ -102,7 +102,7 @@ void ClusterTest::MeasureLoss(const std::string& name, int node, uint32_t refere
     std::vector<std::thread> probes;
     std::unique_lock<std::mutex> lock(mutex);
     while (!first && Since(killed) < kRecoveryLimit) {
-        probes.emplace_back([&] {
+        probes.emplace_back([&, started = Since(killed)] {
             const CallResult result = Write(reference, "8.5");
             EXPECT_LE(result.took, kRequestTimeout + kCallMargin) << name << ": a write overran";
             const std::lock_guard<std::mutex> guard(mutex);
@@ -111,8 +111,9 @@ void ClusterTest::MeasureLoss(const std::string& name, int node, uint32_t refere
                 succeeded.notify_all();
             } else {
                 EXPECT_TRUE(IsBusFailure(result.status)) << name << ": " << result.error;
-                failures += " " + std::to_string(result.status) + "/" +
-                            std::to_string(result.took.count()) + "ms";
+                failures += " " + std::to_string(result.status) + " after " +
+                            std::to_string(result.took.count()) + " ms, sent at " +
+                            std::to_string(started.count()) + " ms;";
             }
         });
         succeeded.wait_for(lock, kProbePace, [&] { return first.has_value(); });
