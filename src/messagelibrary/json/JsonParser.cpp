@@ -1,5 +1,6 @@
 #include "messagelibrary/json/JsonParser.h"
 
+#include <algorithm>
 #include <cstring>
 #include <deque>
 #include <memory>
@@ -24,7 +25,9 @@ using Jsonz::JsonToken;
 class TreeBuilder {
 public:
     explicit TreeBuilder(std::size_t textLength) : pool_(std::make_unique<JsonPool>(textLength)) {
-        values_.reserve(64);
+        // About one value per 32 bytes of text: a large array is then built
+        // without moving its finished elements from one buffer to the next.
+        values_.reserve(std::max<std::size_t>(64, textLength / 32));
         keys_.reserve(32);
         frames_.reserve(16);
     }
