@@ -24,4 +24,14 @@ constexpr CivilDate CivilFromDays(int64_t days) {
             doy - (153 * mp + 2) / 5 + 1};
 }
 
+// Days since 1970-01-01 (negative before it) of a valid date.
+constexpr int64_t DaysFromCivil(int64_t year, unsigned month, unsigned day) {
+    year -= month <= 2 ? 1 : 0;
+    const int64_t era = (year >= 0 ? year : year - 399) / 400;
+    const unsigned yoe = static_cast<unsigned>(year - era * 400);
+    const unsigned doy = (153 * (month > 2 ? month - 3 : month + 9) + 2) / 5 + day - 1;
+    const unsigned doe = yoe * 365 + yoe / 4 - yoe / 100 + doy;
+    return era * 146097 + static_cast<int64_t>(doe) - 719468;
+}
+
 }  // namespace Korvane::Veldra::VeldraMessageLibrary

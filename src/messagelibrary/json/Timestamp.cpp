@@ -1,6 +1,7 @@
 #include "messagelibrary/json/Timestamp.h"
 
 #include <boost/date_time/gregorian/gregorian_types.hpp>
+#include <algorithm>
 #include <cstring>
 #include <limits>
 #include <string>
@@ -53,9 +54,16 @@ bool ParseDigits(std::string_view text, std::size_t from, std::size_t length, in
     return true;
 }
 
-bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
-    // The text without its separators, in place for any text a timestamp
-    // can be; longer ones take the heap.
+// The pieces of a time's text, as read.
+struct TimeFields {
+    int64_t year = 0, month = 0, day = 0;
+    int64_t hours = 0, minutes = 0, seconds = 0, fraction = 0;
+};
+
+// Reads the text without its separators (every ":", "-" and "Z" dropped),
+// cut at fixed places: any form the calendar's own reader takes.
+bool ReadStripped(const char* text, std::size_t length, TimeFields& f) {
+    // In place for any text a timestamp can be; longer ones take the heap.
     char local[64];
     std::string longer;
     char* kept = local;
@@ -74,45 +82,76 @@ bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
     const std::string_view datePart = stripped.substr(0, t);
     const std::string_view timePart = stripped.substr(t + 1);
     if (timePart.empty()) return false;
-
-    int64_t year = 0, month = 0, day = 0;
-    if (!ParseDigits(datePart, 0, 4, year) || !ParseDigits(datePart, 4, 2, month) ||
-        !ParseDigits(datePart, 6, 2, day)) {
-        return false;
-    }
-    if (year < 1400 || year > 9999 || month < 1 || month > 12 || day < 1) return false;
-    if (day > boost::gregorian::gregorian_calendar::end_of_month_day(
-                  static_cast<unsigned short>(year), static_cast<unsigned short>(month))) {
-        return false;
-    }
-
-    int64_t hours = 0, minutes = 0, seconds = 0, fraction = 0;
-    if (!ParseDigits(timePart, 0, 2, hours) || !ParseDigits(timePart, 2, 2, minutes) ||
-        !ParseDigits(timePart, 4, 2, seconds)) {
+    if (!ParseDigits(datePart, 0, 4, f.year) || !ParseDigits(datePart, 4, 2, f.month) ||
+        !ParseDigits(datePart, 6, 2, f.day) || !ParseDigits(timePart, 0, 2, f.hours) ||
+        !ParseDigits(timePart, 2, 2, f.minutes) || !ParseDigits(timePart, 4, 2, f.seconds)) {
         return false;
     }
     // The last piece: up to 7 characters, the first meant to be the ".".
     if (timePart.size() > 7) {
         const std::string_view digits = timePart.substr(7, 6);
-        if (!ParseDigits(digits, 0, digits.size(), fraction)) return false;
-        for (std::size_t n = digits.size(); n < 6; ++n) fraction *= 10;
+        if (!ParseDigits(digits, 0, digits.size(), f.fraction)) return false;
+        for (std::size_t n = digits.size(); n < 6; ++n) f.fraction *= 10;
     }
+    return true;
+}
 
-    try {
-        const boost::gregorian::date date(static_cast<unsigned short>(year),
-                                          static_cast<unsigned short>(month),
-                                          static_cast<unsigned short>(day));
-        const int64_t micros =
-            ((hours * 60 + minutes) * 60 + seconds) * kMicrosPerSecond + fraction;
-        const ptime point(date, boost::posix_time::microseconds(micros));
-        // Hours that roll beyond the last day of 9999 leave the calendar.
-        if (point.is_special() || (point - UnixEpoch()).total_microseconds() > kLastMicros) {
-            return false;
-        }
-        result = point;
-    } catch (const std::exception&) {
+bool FixedDigits(const char* at, int count, int64_t& value) {
+    value = 0;
+    for (int i = 0; i < count; ++i) {
+        if (at[i] < '0' || at[i] > '9') return false;
+        value = value * 10 + (at[i] - '0');
+    }
+    return true;
+}
+
+// Reads the form this library writes, "YYYY-MM-DDTHH:MM:SS", then "." and
+// digits, then "Z", the last two optional, at its fixed places. For such a
+// text the result is what ReadStripped gives; any other text is refused here
+// and left to it.
+bool ReadWireForm(const char* t, std::size_t length, TimeFields& f) {
+    if (length < 19 || t[4] != '-' || t[7] != '-' || t[10] != 'T' || t[13] != ':' ||
+        t[16] != ':') {
         return false;
     }
+    if (!FixedDigits(t, 4, f.year) || !FixedDigits(t + 5, 2, f.month) ||
+        !FixedDigits(t + 8, 2, f.day) || !FixedDigits(t + 11, 2, f.hours) ||
+        !FixedDigits(t + 14, 2, f.minutes) || !FixedDigits(t + 17, 2, f.seconds)) {
+        return false;
+    }
+    std::size_t i = 19;
+    f.fraction = 0;
+    if (i < length && t[i] == '.') {
+        const std::size_t first = ++i;
+        while (i < length && t[i] >= '0' && t[i] <= '9') ++i;
+        const int used = static_cast<int>(std::min<std::size_t>(i - first, 6));
+        if (used == 0) return false;
+        FixedDigits(t + first, used, f.fraction);
+        for (int n = used; n < 6; ++n) f.fraction *= 10;
+    }
+    if (i < length && t[i] == 'Z') ++i;
+    return i == length;
+}
+
+bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
+    TimeFields f;
+    if (!ReadWireForm(text, length, f) && !ReadStripped(text, length, (f = TimeFields()))) {
+        return false;
+    }
+    if (f.year < 1400 || f.year > 9999 || f.month < 1 || f.month > 12 || f.day < 1) return false;
+    if (f.day > boost::gregorian::gregorian_calendar::end_of_month_day(
+                    static_cast<unsigned short>(f.year), static_cast<unsigned short>(f.month))) {
+        return false;
+    }
+    // The date is valid by now: its day number and the time of day give the
+    // point, as the calendar's own types would, without their checks again.
+    const int64_t micros =
+        DaysFromCivil(f.year, static_cast<unsigned>(f.month), static_cast<unsigned>(f.day)) *
+            kMicrosPerDay +
+        ((f.hours * 60 + f.minutes) * 60 + f.seconds) * kMicrosPerSecond + f.fraction;
+    // Hours that roll beyond the last day of 9999 leave the calendar.
+    if (micros > kLastMicros) return false;
+    result = UnixEpoch() + boost::posix_time::microseconds(micros);
     return true;
 }
 

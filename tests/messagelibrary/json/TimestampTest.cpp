@@ -123,6 +123,13 @@ TEST(Timestamp, WrittenPointsReadBack) {
         ASSERT_TRUE(ParseTimestamp(TimestampToText(point), back)) << TimestampToText(point);
         EXPECT_EQ(back, point);
     }
+    // Across the whole calendar, leap days and century years among them.
+    for (date day(1400, 1, 1); day < date(9999, 12, 31); day += boost::gregorian::days(13)) {
+        const Timestamp point(day, hours(23) + microseconds(7));
+        Timestamp back;
+        ASSERT_TRUE(ParseTimestamp(TimestampToText(point), back)) << TimestampToText(point);
+        ASSERT_EQ(back, point) << TimestampToText(point);
+    }
 }
 
 TEST(Timestamp, Ticks) {
