@@ -20,18 +20,18 @@ void AppendChars(JsonOutput& out, T value, Format... format) {
 // room for the longest escape of every byte and are written in one pass.
 constexpr std::size_t kMeasuredTextSize = 4096;
 
-// `text` escaped and between quotes, after `before` and followed by `after`
-// (each of at most two bytes).
-void AppendQuoted(JsonOutput& out, std::string_view before, std::string_view text,
-                  std::string_view after) {
+// A text in quotes, escaped, with a separator character before and after it
+// ('\0' for none): single characters, so that no copy of a length known only
+// at run time is made for them.
+void AppendQuoted(JsonOutput& out, char before, std::string_view text, char after) {
     const std::size_t escaped =
         text.size() < kMeasuredTextSize ? text.size() * 6 : JsonEscapedLength(text);
-    char* at = out.Room(before.size() + escaped + after.size() + 2);
-    for (const char c : before) *at++ = c;
+    char* at = out.Room(escaped + 4);
+    if (before != '\0') *at++ = before;
     *at++ = '"';
     at = WriteJsonEscaped(at, text);
     *at++ = '"';
-    for (const char c : after) *at++ = c;
+    if (after != '\0') *at++ = after;
     out.Advance(at);
 }
 
@@ -77,7 +77,7 @@ void AppendJsonTimestamp(JsonOutput& out, const Timestamp& value) {
 }
 
 void AppendJsonString(JsonOutput& out, std::string_view text) {
-    AppendQuoted(out, {}, text, {});
+    AppendQuoted(out, '\0', text, '\0');
 }
 
 void AppendJsonBase64(JsonOutput& out, const void* data, std::size_t size) {
@@ -88,7 +88,7 @@ void AppendJsonBase64(JsonOutput& out, const void* data, std::size_t size) {
 }
 
 void JsonObjectWriter::AppendKey(std::string_view key) {
-    AppendQuoted(out_, first_ ? std::string_view() : std::string_view(","), key, ":");
+    AppendQuoted(out_, first_ ? '\0' : ',', key, ':');
     first_ = false;
 }
 
