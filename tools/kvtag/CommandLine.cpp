@@ -92,9 +92,8 @@ void ParseListen(Invocation& call, const std::string& text) {
     if (host.size() > 2 && host.front() == '[' && host.back() == ']') {
         host = host.substr(1, host.size() - 2);
     }
-    bool digits = !port.empty() && port.size() <= 5;
-    for (const char c : port) digits = digits && c >= '0' && c <= '9';
-    if (host.empty() || !digits || std::strtoul(port.c_str(), nullptr, 10) > 65535) {
+    const auto number = ParseUint32(port);
+    if (host.empty() || port.size() > 5 || !number || *number > 65535) {
         throw UsageError(
             "--listen needs HOST:PORT with a port from 0 to 65535, such as "
             "127.0.0.1:8080, not '" +
@@ -102,7 +101,7 @@ void ParseListen(Invocation& call, const std::string& text) {
             call.command);
     }
     call.listenHost = host;
-    call.listenPort = static_cast<uint16_t>(std::strtoul(port.c_str(), nullptr, 10));
+    call.listenPort = static_cast<uint16_t>(*number);
 }
 
 void RequirePath(const std::string& path, Command command) {
