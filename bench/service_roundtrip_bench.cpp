@@ -19,6 +19,7 @@
 #include <atomic>
 #include <chrono>
 #include <cstdio>
+#include <deque>
 #include <fstream>
 #include <map>
 #include <memory>
@@ -194,6 +195,117 @@ private:
     std::thread thread_;
 };
 
+// Deliveries handed from one thread to another, each with one wake-up.
+class HandOver {
+public:
+    void Put(Delivery delivery) {
+        {
+            std::lock_guard<std::mutex> lock(mutex_);
+            waiting_.push_back(std::move(delivery));
+        }
+        ready_.Release();
+    }
+    bool Take(Delivery& out, uint32_t timeoutMs) {
+        if (!ready_.Acquire(timeoutMs)) return false;
+        std::lock_guard<std::mutex> lock(mutex_);
+        out = std::move(waiting_.front());
+        waiting_.pop_front();
+        return true;
+    }
+
+private:
+    std::mutex mutex_;
+    std::deque<Delivery> waiting_;
+    Bus::Semaphore ready_;
+};
+
+// A raw responder in the library's shape: it receives on one connection and
+// answers on another, and its reader hands each request to a handling
+// thread, which answers.
+class ShapedResponder {
+public:
+    ShapedResponder(const BrokerAddress& broker, const std::string& exchange,
+                    const std::string& key, const amqp_basic_properties_t* wire)
+        : in_(broker), out_(broker), exchange_(exchange), wire_(wire) {
+        in_.Listen(exchange, key, key);
+        reader_ = std::thread([this] {
+            Delivery request;
+            RunUntil(stop_, [&] {
+                if (in_.Next(request, 100)) requests_.Put(std::move(request));
+            });
+        });
+        handler_ = std::thread([this] {
+            Delivery request;
+            RunUntil(stop_, [&] {
+                if (requests_.Take(request, 100)) {
+                    out_.Publish(exchange_, request.replyTo, request.correlationId, "", wire_);
+                }
+            });
+        });
+    }
+    ~ShapedResponder() {
+        stop_ = true;
+        reader_.join();
+        handler_.join();
+    }
+
+private:
+    RawConnection in_, out_;
+    const std::string exchange_;
+    const amqp_basic_properties_t* wire_;
+    HandOver requests_;
+    std::atomic<bool> stop_{false};
+    std::thread reader_, handler_;
+};
+
+// The raw round trip in the library's shape, with no library code in it: the
+// shaped responder, and a requester that sends on one connection while a
+// reader on another hands each reply to the waiting caller. Against the plain
+// raw round trip it shows what that shape costs by itself.
+class ShapedRoundTrip {
+public:
+    ShapedRoundTrip(const BrokerAddress& broker, const std::string& exchange,
+                    const std::string& server, const std::string& reply,
+                    const amqp_basic_properties_t* wire)
+        : responder_(broker, exchange, server, wire),
+          in_(broker),
+          out_(broker),
+          exchange_(exchange),
+          server_(server),
+          reply_(reply),
+          wire_(wire) {
+        in_.Listen(exchange, reply, reply);
+        reader_ = std::thread([this] {
+            Delivery reply;
+            RunUntil(stop_, [&] {
+                if (in_.Next(reply, 100)) replies_.Put(std::move(reply));
+            });
+        });
+    }
+    ~ShapedRoundTrip() {
+        stop_ = true;
+        reader_.join();
+    }
+
+    bool RoundTrip(const std::string& id) {
+        out_.Publish(exchange_, server_, id, reply_, wire_);
+        Delivery response;
+        while (replies_.Take(response, kReplyTimeoutMs)) {
+            if (response.correlationId == id) return true;
+        }
+        return false;
+    }
+
+private:
+    ShapedResponder responder_;
+    RawConnection in_, out_;
+    const std::string exchange_, server_, reply_;
+    const amqp_basic_properties_t* wire_;
+    HandOver replies_;
+    std::atomic<bool> stop_{false};
+    std::thread reader_;
+};
+
 // ---- Through MessageService ----
 
 class BenchRequest : public Bus::RequestMessage {
@@ -292,6 +404,15 @@ void MeasureSequential(benchmark::State& state, const char* name, RoundTrip roun
     state.counters["round_trips_per_s"] = figures.perSecond;
 }
 
+void BM_RoundTripRawShaped(benchmark::State& state) {
+    const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.sserver." + g_tag;
+    const std::string reply = "bench.raw.sclient." + g_tag;
+    ShapedRoundTrip shaped(*g_broker, exchange, server, reply, WireOf(state));
+    int next = 0;
+    MeasureSequential(state, "raw_shaped",
+                      [&] { return shaped.RoundTrip(std::to_string(next++)); });
+}
+
 void BM_RoundTripRaw(benchmark::State& state) {
     const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.server." + g_tag;
     const std::string reply = "bench.raw.client." + g_tag;
@@ -374,12 +495,20 @@ void ReportPipeline(benchmark::State& state, const char* name, double perSecond)
     state.SetItemsProcessed(static_cast<int64_t>(kPipelineThreads) * kPipelinePerThread);
 }
 
+// Argument 2 set: the responder in the library's shape (ShapedResponder).
 void BM_PipelinedRaw(benchmark::State& state) {
     const std::string exchange = "kvveldra.bench.raw", server = "bench.raw.pserver." + g_tag;
     const std::string reply = "bench.raw.pclient." + g_tag;
     const amqp_basic_properties_t* wire = WireOf(state);
+    const bool shaped = state.range(1) != 0;
     for (auto _ : state) {
-        RawResponder responder(*g_broker, exchange, server, wire);
+        std::optional<RawResponder> plain;
+        std::optional<ShapedResponder> handed;
+        if (shaped) {
+            handed.emplace(*g_broker, exchange, server, wire);
+        } else {
+            plain.emplace(*g_broker, exchange, server, wire);
+        }
         RawConnection publisher(*g_broker), consumer(*g_broker);
         consumer.Listen(exchange, reply, reply);
         Pipeline pipeline;
@@ -400,7 +529,9 @@ void BM_PipelinedRaw(benchmark::State& state) {
         });
         stop = true;
         reader.join();
-        ReportPipeline(state, RawName(state, "raw_pipelined").c_str(), perSecond);
+        ReportPipeline(state,
+                       shaped ? "raw_pipelined_shaped" : RawName(state, "raw_pipelined").c_str(),
+                       perSecond);
     }
 }
 
@@ -434,8 +565,9 @@ void BM_PipelinedService(benchmark::State& state) {
 // Raw runs: argument 0 sends a minimal message (content type, correlation id,
 // reply-to, "{}"), 1 the same properties and header table as MessageService.
 BENCHMARK(BM_RoundTripRaw)->Arg(0)->Arg(1)->Iterations(kSequentialRoundTrips)->UseRealTime();
+BENCHMARK(BM_RoundTripRawShaped)->Arg(1)->Iterations(kSequentialRoundTrips)->UseRealTime();
 BENCHMARK(BM_RoundTripService)->Iterations(kSequentialRoundTrips)->UseRealTime();
-BENCHMARK(BM_PipelinedRaw)->Arg(0)->Arg(1)->Iterations(1)->UseRealTime();
+BENCHMARK(BM_PipelinedRaw)->Args({0, 0})->Args({1, 0})->Args({1, 1})->Iterations(1)->UseRealTime();
 BENCHMARK(BM_PipelinedService)->Iterations(1)->UseRealTime();
 
 void PrintRatios() {
@@ -443,11 +575,19 @@ void PrintRatios() {
     const Figures raw = g_figures["raw"], service = g_figures["service"];
     PrintRatio("round trip p50, MessageService / raw", service.p50Us, raw.p50Us, "<= 1.08");
     PrintRatio("round trip p99, MessageService / raw", service.p99Us, raw.p99Us, "-");
+    // The threads and connections the design prescribes, without the library.
+    const Figures shaped = g_figures["raw_shaped"];
+    PrintRatio("round trip p50, raw in the library's shape / raw", shaped.p50Us, raw.p50Us, "-");
+    PrintRatio("round trip p50, MessageService / raw in the library's shape", service.p50Us,
+               shaped.p50Us, "-");
     PrintRatio("sequential round trips/s, MessageService / raw", service.perSecond, raw.perSecond,
                "-");
     PrintRatio("pipelined requests/s, SendRequestAsync / raw",
                g_figures["service_pipelined"].perSecond, g_figures["raw_pipelined"].perSecond,
                ">= 0.95");
+    PrintRatio("pipelined requests/s, raw with the library's responder shape / raw",
+               g_figures["raw_pipelined_shaped"].perSecond, g_figures["raw_pipelined"].perSecond,
+               "-");
     // The same against a raw message without the library's header table.
     const Figures minimal = g_figures["raw_minimal"];
     PrintRatio("round trip p50, MessageService / raw minimal message", service.p50Us, minimal.p50Us,

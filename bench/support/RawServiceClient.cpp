@@ -34,6 +34,34 @@ MessageBus::MessageBase& Addressed(MessageBus::MessageBase& message, const std::
     return message;
 }
 
+// A connection with channel 1 open; throws std::runtime_error when the
+// broker refuses.
+amqp_connection_state_t Open(const BrokerAddress& broker) {
+    amqp_connection_state_t state = amqp_new_connection();
+    amqp_socket_t* socket = amqp_tcp_socket_new(state);
+    if (socket == nullptr || amqp_socket_open(socket, broker.host.c_str(), broker.port) != 0) {
+        amqp_destroy_connection(state);
+        throw std::runtime_error("cannot open a socket to the broker");
+    }
+    try {
+        Check(amqp_login(state, "/", 0, 131072, 0, AMQP_SASL_METHOD_PLAIN, broker.user.c_str(),
+                         broker.password.c_str()),
+              "login");
+        amqp_channel_open(state, 1);
+        Check(amqp_get_rpc_reply(state), "channel.open");
+    } catch (...) {
+        amqp_destroy_connection(state);
+        throw;
+    }
+    return state;
+}
+
+void Close(amqp_connection_state_t state) {
+    amqp_channel_close(state, 1, AMQP_REPLY_SUCCESS);
+    amqp_connection_close(state, AMQP_REPLY_SUCCESS);
+    amqp_destroy_connection(state);
+}
+
 }  // namespace
 
 RawServiceClient::Prepared::Prepared(MessageBus::MessageBase& message, const std::string& replyTo)
@@ -42,19 +70,10 @@ RawServiceClient::Prepared::Prepared(MessageBus::MessageBase& message, const std
       record(MessageBus::ToAmqpProperties(message.Headers())),
       properties(record) {}
 
-RawServiceClient::RawServiceClient(const BrokerAddress& broker, const std::string& exchange)
-    : state_(amqp_new_connection()), exchange_(exchange), name_(NewClientName()) {
-    amqp_socket_t* socket = amqp_tcp_socket_new(state_);
-    if (socket == nullptr || amqp_socket_open(socket, broker.host.c_str(), broker.port) != 0) {
-        amqp_destroy_connection(state_);
-        throw std::runtime_error("cannot open a socket to the broker");
-    }
+RawServiceClient::RawServiceClient(const BrokerAddress& broker, const std::string& exchange,
+                                   bool handOff)
+    : state_(Open(broker)), exchange_(exchange), name_(NewClientName()) {
     try {
-        Check(amqp_login(state_, "/", 0, 131072, 0, AMQP_SASL_METHOD_PLAIN, broker.user.c_str(),
-                         broker.password.c_str()),
-              "login");
-        amqp_channel_open(state_, 1);
-        Check(amqp_get_rpc_reply(state_), "channel.open");
         const std::string key = "Veldra." + name_ + ".#";
         amqp_queue_declare(state_, 1, amqp_cstring_bytes(name_.c_str()), 0, 0, 0, 1,
                            amqp_empty_table);
@@ -66,16 +85,22 @@ RawServiceClient::RawServiceClient(const BrokerAddress& broker, const std::strin
         amqp_basic_consume(state_, 1, amqp_cstring_bytes(name_.c_str()), amqp_empty_bytes, 0, 1, 0,
                            amqp_empty_table);
         Check(amqp_get_rpc_reply(state_), "basic.consume");
+        if (handOff) {
+            publisher_ = Open(broker);
+            reader_ = std::thread([this] { ReadReplies(); });
+        }
     } catch (...) {
+        if (publisher_ != nullptr) amqp_destroy_connection(publisher_);
         amqp_destroy_connection(state_);
         throw;
     }
 }
 
 RawServiceClient::~RawServiceClient() {
-    amqp_channel_close(state_, 1, AMQP_REPLY_SUCCESS);
-    amqp_connection_close(state_, AMQP_REPLY_SUCCESS);
-    amqp_destroy_connection(state_);
+    stop_ = true;
+    if (reader_.joinable()) reader_.join();
+    if (publisher_ != nullptr) Close(publisher_);
+    Close(state_);
 }
 
 std::unique_ptr<RawServiceClient::Prepared> RawServiceClient::Prepare(
@@ -84,17 +109,42 @@ std::unique_ptr<RawServiceClient::Prepared> RawServiceClient::Prepare(
 }
 
 void RawServiceClient::RoundTrip(const Prepared& message) {
-    if (amqp_basic_publish(state_, 1, amqp_cstring_bytes(exchange_.c_str()),
+    amqp_connection_state_t out = publisher_ != nullptr ? publisher_ : state_;
+    if (amqp_basic_publish(out, 1, amqp_cstring_bytes(exchange_.c_str()),
                            amqp_cstring_bytes(message.routingKey.c_str()), 0, 0,
                            message.properties.Get(),
                            amqp_cstring_bytes(message.body.c_str())) != 0) {
         throw std::runtime_error("rabbitmq-c failed: basic.publish");
+    }
+    if (publisher_ != nullptr) {
+        if (!replies_.Acquire(kReplyTimeoutSeconds * 1000)) {
+            throw std::runtime_error("no reply in time");
+        }
+        return;
     }
     amqp_maybe_release_buffers(state_);
     amqp_envelope_t envelope;
     timeval timeout{kReplyTimeoutSeconds, 0};
     Check(amqp_consume_message(state_, &envelope, &timeout, 0), "consume");
     amqp_destroy_envelope(&envelope);
+}
+
+// Each reply wakes the caller; a time-out of the wait only looks at stop_.
+// A failure ends the thread, and the caller then runs out of time.
+void RawServiceClient::ReadReplies() {
+    while (!stop_) {
+        amqp_maybe_release_buffers(state_);
+        amqp_envelope_t envelope;
+        timeval timeout{0, 100000};
+        const amqp_rpc_reply_t reply = amqp_consume_message(state_, &envelope, &timeout, 0);
+        if (reply.reply_type == AMQP_RESPONSE_NORMAL) {
+            amqp_destroy_envelope(&envelope);
+            replies_.Release();
+        } else if (reply.reply_type != AMQP_RESPONSE_LIBRARY_EXCEPTION ||
+                   reply.library_error != AMQP_STATUS_TIMEOUT) {
+            return;
+        }
+    }
 }
 
 }  // namespace Korvane::Veldra::Bench

@@ -2,10 +2,13 @@
 
 #include <amqp.h>
 
+#include <atomic>
 #include <memory>
 #include <string>
+#include <thread>
 
 #include "messagebus/amqp/AmqpPropertiesC.h"
+#include "messagebus/concurrency/Semaphore.h"
 #include "messagelibrary/MessageBase.h"
 #include "support/BenchBroker.h"
 
@@ -34,7 +37,13 @@ public:
     // Connects and binds a reply queue of a new name to "Veldra.<name>.#" on
     // the exchange, so that the service's answers to ReplyTo <name> arrive on
     // it; throws std::runtime_error when the broker refuses.
-    RawServiceClient(const BrokerAddress& broker, const std::string& exchange);
+    //
+    // With handOff the client takes the library's shape: requests go out on
+    // a second connection, and a thread of its own reads the replies and
+    // hands each to the waiting caller. The difference from the plain client
+    // is what that shape costs a round trip, with no library code in it.
+    RawServiceClient(const BrokerAddress& broker, const std::string& exchange,
+                     bool handOff = false);
     ~RawServiceClient();
     RawServiceClient(const RawServiceClient&) = delete;
     RawServiceClient& operator=(const RawServiceClient&) = delete;
@@ -46,9 +55,15 @@ public:
     void RoundTrip(const Prepared& message);
 
 private:
-    amqp_connection_state_t state_;
+    void ReadReplies();
+
+    amqp_connection_state_t state_;                // consumes the replies
+    amqp_connection_state_t publisher_ = nullptr;  // with handOff only
     const std::string exchange_;
     const std::string name_;
+    MessageBus::Semaphore replies_;
+    std::atomic<bool> stop_{false};
+    std::thread reader_;
 };
 
 }  // namespace Korvane::Veldra::Bench

@@ -94,15 +94,16 @@ public:
 
     // ---- Write ----
     // One message with the tag's samples, in their order, to "TagIngestion".
+    // The samples move into the message: a write of many values is not copied.
     int32_t WriteValues(const std::shared_ptr<TagData>& tag,
-                        const std::vector<VeldraMessageLibrary::TagValueSample>& samples,
+                        std::vector<VeldraMessageLibrary::TagValueSample> samples,
                         const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
                         uint32_t& timeoutMs, std::string& error);
     // One message for many paths: samples[i] belongs to paths[i]; a path
     // named several times gets one entry with its samples in input order.
     // `samples` must be at least as long as `paths`.
     int32_t WriteMulti(const std::vector<std::string>& paths,
-                       const std::vector<VeldraMessageLibrary::TagValueSample>& samples,
+                       std::vector<VeldraMessageLibrary::TagValueSample> samples,
                        const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
                        uint32_t& timeoutMs, std::string& error);
 

@@ -1,5 +1,6 @@
 // The write path: samples go to "TagIngestion" as they are, one message a call.
 #include <unordered_map>
+#include <utility>
 
 #include "messagelibrary/tagingestion/TagUpdateValuesRoutedMessage.h"
 #include "taglibrary/Client.h"
@@ -11,7 +12,7 @@ using VeldraMessageLibrary::TagValueSample;
 using VeldraMessageLibrary::TagIngestionMessages::TagUpdateValuesRoutedMessage;
 
 int32_t Client::WriteValues(const std::shared_ptr<TagData>& tag,
-                            const std::vector<TagValueSample>& samples,
+                            std::vector<TagValueSample> samples,
                             const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
                             uint32_t& timeoutMs, std::string& error) {
     if (!tag) return ReportError("Tag.InvalidTagReference", error);
@@ -20,20 +21,24 @@ int32_t Client::WriteValues(const std::shared_ptr<TagData>& tag,
         std::lock_guard<std::mutex> lock(mutex_);
         path = tag->path;
     }
-    TagUpdateValuesRoutedMessage message(
-        std::vector<TagPathUpdates>{TagPathUpdates{std::move(path), samples}});
+    // Built in place: a braced list would copy every sample once more.
+    std::vector<TagPathUpdates> updates;
+    updates.push_back(TagPathUpdates{std::move(path), std::move(samples)});
+    TagUpdateValuesRoutedMessage message(std::move(updates));
     return SendTrackedRouted(message, request, requestId, timeoutMs, error);
 }
 
 int32_t Client::WriteMulti(const std::vector<std::string>& paths,
-                           const std::vector<TagValueSample>& samples,
+                           std::vector<TagValueSample> samples,
                            const std::shared_ptr<AsyncRequest>& request, uint32_t& requestId,
                            uint32_t& timeoutMs, std::string& error) {
     if (samples.size() < paths.size()) return ReportError("Tag.InvalidState", error);
     // Grouped by exact path; the order of the paths means nothing, the order
     // of one path's samples is the caller's.
     std::unordered_map<std::string, std::vector<TagValueSample>> grouped;
-    for (std::size_t i = 0; i < paths.size(); ++i) grouped[paths[i]].push_back(samples[i]);
+    for (std::size_t i = 0; i < paths.size(); ++i) {
+        grouped[paths[i]].push_back(std::move(samples[i]));
+    }
     std::vector<TagPathUpdates> updates;
     updates.reserve(grouped.size());
     for (auto& [path, pathSamples] : grouped) {

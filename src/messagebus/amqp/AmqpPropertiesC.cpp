@@ -1,5 +1,7 @@
 #include "messagebus/amqp/AmqpPropertiesC.h"
 
+#include <algorithm>
+#include <cstddef>
 #include <string>
 
 namespace Korvane::Veldra::MessageBus {
@@ -85,6 +87,8 @@ AmqpProperties FromAmqpBasicProperties(const amqp_basic_properties_t& properties
     if (flags & AMQP_BASIC_TIMESTAMP_FLAG) record.timestamp = properties.timestamp;
     if (flags & AMQP_BASIC_TYPE_FLAG) record.type = TextOf(properties.type);
     if ((flags & AMQP_BASIC_HEADERS_FLAG) && properties.headers.entries != nullptr) {
+        record.headers.reserve(
+            static_cast<std::size_t>(std::max(0, properties.headers.num_entries)));
         for (int i = 0; i < properties.headers.num_entries; ++i) {
             const amqp_table_entry_t& entry = properties.headers.entries[i];
             record.headers.push_back(AmqpHeaderEntry{

@@ -51,7 +51,8 @@ int32_t TagConsoleWriteTag(uint32_t tagReference, int32_t dataType,
                 client,
                 [&](const std::shared_ptr<ConsoleAsyncRequest>& request, uint32_t& requestId,
                     uint32_t& timeoutMs, std::string& out) {
-                    return client.WriteValues(tag, samples, request, requestId, timeoutMs, out);
+                    return client.WriteValues(tag, std::move(samples), request, requestId,
+                                              timeoutMs, out);
                 },
                 text);
         });

@@ -36,7 +36,7 @@ int32_t WriteOnHostTag(uint32_t tagReference, int32_t dataType, std::size_t coun
                 samples.push_back(
                     TagValueSample{HostTimestampAt(timestamps, i), TagValue{type, std::move(value)}});
             }
-            return client.WriteValues(tag, samples, makeRequest(), id, timeout, text);
+            return client.WriteValues(tag, std::move(samples), makeRequest(), id, timeout, text);
         });
 }
 
@@ -64,7 +64,7 @@ int32_t WriteOnHostInstance(uint64_t instanceId, Array** values, uint32_t* reque
                 samples.push_back(TagValueSample{HostTimestampOrNone(element.timestamp),
                                                  TagValue{type, std::move(value)}});
             }
-            return client.WriteMulti(paths, samples, makeRequest(), id, timeout, text);
+            return client.WriteMulti(paths, std::move(samples), makeRequest(), id, timeout, text);
         });
 }
 
