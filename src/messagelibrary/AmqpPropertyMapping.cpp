@@ -63,9 +63,12 @@ MessageHeaders HeadersFromAmqp(AmqpProperties properties, const std::string& rou
     headers.correlationId = correlationId.substr(0, correlationId.find('\0'));
 
     if (HasFlag(properties, kHeaders)) {
-        // A repeated key keeps its last value.
+        // A repeated key keeps its last value. A sender's table comes in key
+        // order (this library writes it from the map), so each entry is
+        // offered at the end first: one comparison instead of a search.
         for (auto& entry : properties.headers) {
-            headers.headers.insert_or_assign(std::move(entry.key), std::move(entry.value));
+            headers.headers.insert_or_assign(headers.headers.end(), std::move(entry.key),
+                                             std::move(entry.value));
         }
     }
     // The values computed here are written after the sender's table on

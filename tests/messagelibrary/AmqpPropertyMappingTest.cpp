@@ -115,6 +115,17 @@ TEST(AmqpPropertyMapping, ReceivedTableEntriesNeverReplaceTheLocalHeaders) {
     EXPECT_EQ(*headers.GetHeader("Count"), "raw");
 }
 
+TEST(AmqpPropertyMapping, ReceivedTableInAnyOrderKeepsTheLastValueOfARepeatedKey) {
+    AmqpProperties properties = Received(0);
+    properties.headers = {{"m", 'S', "1"}, {"z", 'S', "2"}, {"a", 'S', "3"},
+                          {"z", 'S', "4"}, {"m", 'S', "5"}, {"b", 'S', "6"}};
+    const MessageHeaders headers = HeadersFromAmqp(properties, "", "ctag", 1);
+    std::vector<std::string> table;
+    for (const auto& [key, value] : headers.headers) table.push_back(key + "=" + value);
+    EXPECT_EQ(table, (std::vector<std::string>{"ConsumerTag=ctag", "DeliveryTag=1",
+                                               "Persistent=false", "a=3", "b=6", "m=5", "z=4"}));
+}
+
 TEST(AmqpPropertyMapping, ReceiveIgnoresPropertiesWhoseFlagIsClear) {
     AmqpProperties properties;
     properties.type = "Stale";
