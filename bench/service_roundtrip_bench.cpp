@@ -19,7 +19,6 @@
 #include <atomic>
 #include <chrono>
 #include <cstdio>
-#include <deque>
 #include <fstream>
 #include <map>
 #include <memory>
@@ -33,6 +32,7 @@
 #include "messagebus/amqp/AmqpConnectionManager.h"
 #include "messagebus/amqp/AmqpPropertiesC.h"
 #include "messagebus/concurrency/Semaphore.h"
+#include "messagebus/concurrency/SharedQueue.h"
 #include "messagebus/service/MessageService.h"
 #include "messagelibrary/AmqpPropertyMapping.h"
 #include "messagelibrary/RequestMessage.h"
@@ -195,29 +195,8 @@ private:
     std::thread thread_;
 };
 
-// Deliveries handed from one thread to another, each with one wake-up.
-class HandOver {
-public:
-    void Put(Delivery delivery) {
-        {
-            std::lock_guard<std::mutex> lock(mutex_);
-            waiting_.push_back(std::move(delivery));
-        }
-        ready_.Release();
-    }
-    bool Take(Delivery& out, uint32_t timeoutMs) {
-        if (!ready_.Acquire(timeoutMs)) return false;
-        std::lock_guard<std::mutex> lock(mutex_);
-        out = std::move(waiting_.front());
-        waiting_.pop_front();
-        return true;
-    }
-
-private:
-    std::mutex mutex_;
-    std::deque<Delivery> waiting_;
-    Bus::Semaphore ready_;
-};
+// Deliveries handed from one thread to another: the bus's own queue.
+using HandOver = Bus::SharedQueue<Delivery>;
 
 // A raw responder in the library's shape: it receives on one connection and
 // answers on another, and its reader hands each request to a handling
@@ -231,13 +210,13 @@ public:
         reader_ = std::thread([this] {
             Delivery request;
             RunUntil(stop_, [&] {
-                if (in_.Next(request, 100)) requests_.Put(std::move(request));
+                if (in_.Next(request, 100)) requests_.Add(std::move(request));
             });
         });
         handler_ = std::thread([this] {
             Delivery request;
             RunUntil(stop_, [&] {
-                if (requests_.Take(request, 100)) {
+                if (requests_.TryTake(request, 100)) {
                     out_.Publish(exchange_, request.replyTo, request.correlationId, "", wire_);
                 }
             });
@@ -278,7 +257,7 @@ public:
         reader_ = std::thread([this] {
             Delivery reply;
             RunUntil(stop_, [&] {
-                if (in_.Next(reply, 100)) replies_.Put(std::move(reply));
+                if (in_.Next(reply, 100)) replies_.Add(std::move(reply));
             });
         });
     }
@@ -290,7 +269,7 @@ public:
     bool RoundTrip(const std::string& id) {
         out_.Publish(exchange_, server_, id, reply_, wire_);
         Delivery response;
-        while (replies_.Take(response, kReplyTimeoutMs)) {
+        while (replies_.TryTake(response, kReplyTimeoutMs)) {
             if (response.correlationId == id) return true;
         }
         return false;
