@@ -11,7 +11,6 @@
 // build's benchmarks (tests/integration/broker/broker.env) is read; without a
 // broker the benchmark says so and does nothing.
 #include <amqp.h>
-#include <amqp_tcp_socket.h>
 #include <benchmark/benchmark.h>
 #include <unistd.h>
 
@@ -39,6 +38,7 @@
 #include "support/BenchBroker.h"
 #include "support/BenchServices.h"
 #include "support/Ratios.h"
+#include "support/RawAmqp.h"
 
 namespace {
 
@@ -54,15 +54,12 @@ constexpr int kReplyTimeoutMs = 5000;
 using Korvane::Veldra::Bench::AnsweringResponder;
 using Korvane::Veldra::Bench::BrokerAddress;
 using Korvane::Veldra::Bench::BrokerOrSkip;
+using Korvane::Veldra::Bench::CheckRawReply;
+using Korvane::Veldra::Bench::CloseRawConnection;
+using Korvane::Veldra::Bench::OpenRawConnection;
 using Korvane::Veldra::Bench::ServiceSettings;
 
 // ---- Directly on rabbitmq-c ----
-
-void Check(const amqp_rpc_reply_t& reply, const char* step) {
-    if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
-        throw std::runtime_error(std::string("rabbitmq-c failed: ") + step);
-    }
-}
 
 std::string Text(const amqp_bytes_t& bytes) {
     return std::string(static_cast<const char*>(bytes.bytes), bytes.len);
@@ -75,23 +72,8 @@ struct Delivery {
 // One connection with channel 1, used by one thread at a time.
 class RawConnection {
 public:
-    explicit RawConnection(const BrokerAddress& broker) : state_(amqp_new_connection()) {
-        amqp_socket_t* socket = amqp_tcp_socket_new(state_);
-        if (socket == nullptr || amqp_socket_open(socket, broker.host.c_str(), broker.port) != 0) {
-            amqp_destroy_connection(state_);
-            throw std::runtime_error("cannot open a socket to the broker");
-        }
-        Check(amqp_login(state_, "/", 0, 131072, 0, AMQP_SASL_METHOD_PLAIN, broker.user.c_str(),
-                         broker.password.c_str()),
-              "login");
-        amqp_channel_open(state_, 1);
-        Check(amqp_get_rpc_reply(state_), "channel.open");
-    }
-    ~RawConnection() {
-        amqp_channel_close(state_, 1, AMQP_REPLY_SUCCESS);
-        amqp_connection_close(state_, AMQP_REPLY_SUCCESS);
-        amqp_destroy_connection(state_);
-    }
+    explicit RawConnection(const BrokerAddress& broker) : state_(OpenRawConnection(broker)) {}
+    ~RawConnection() { CloseRawConnection(state_); }
     RawConnection(const RawConnection&) = delete;
     RawConnection& operator=(const RawConnection&) = delete;
 
@@ -100,17 +82,17 @@ public:
     void Listen(const std::string& exchange, const std::string& queue, const std::string& key) {
         amqp_exchange_declare(state_, 1, amqp_cstring_bytes(exchange.c_str()),
                               amqp_cstring_bytes("topic"), 0, 0, 0, 0, amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "exchange.declare");
+        CheckRawReply(amqp_get_rpc_reply(state_), "exchange.declare");
         amqp_queue_declare(state_, 1, amqp_cstring_bytes(queue.c_str()), 0, 0, 0, 1,
                            amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "queue.declare");
+        CheckRawReply(amqp_get_rpc_reply(state_), "queue.declare");
         amqp_queue_bind(state_, 1, amqp_cstring_bytes(queue.c_str()),
                         amqp_cstring_bytes(exchange.c_str()), amqp_cstring_bytes(key.c_str()),
                         amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "queue.bind");
+        CheckRawReply(amqp_get_rpc_reply(state_), "queue.bind");
         amqp_basic_consume(state_, 1, amqp_cstring_bytes(queue.c_str()), amqp_empty_bytes, 0, 1, 0,
                            amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "basic.consume");
+        CheckRawReply(amqp_get_rpc_reply(state_), "basic.consume");
     }
 
     // With base, its properties go out (header table included), with this
@@ -143,7 +125,7 @@ public:
             reply.library_error == AMQP_STATUS_TIMEOUT) {
             return false;
         }
-        Check(reply, "consume");
+        CheckRawReply(reply, "consume");
         out.correlationId = Text(envelope.message.properties.correlation_id);
         out.replyTo = Text(envelope.message.properties.reply_to);
         amqp_destroy_envelope(&envelope);

@@ -1,23 +1,17 @@
 #include "support/RawServiceClient.h"
 
-#include <amqp_tcp_socket.h>
 #include <unistd.h>
 
 #include <atomic>
 #include <stdexcept>
 
 #include "messagelibrary/AmqpPropertyMapping.h"
+#include "support/RawAmqp.h"
 
 namespace Korvane::Veldra::Bench {
 namespace {
 
 constexpr int kReplyTimeoutSeconds = 10;
-
-void Check(amqp_rpc_reply_t reply, const char* what) {
-    if (reply.reply_type != AMQP_RESPONSE_NORMAL) {
-        throw std::runtime_error(std::string("rabbitmq-c failed: ") + what);
-    }
-}
 
 // A name of its own for each client of the process, so that clients on
 // several threads each get their own replies.
@@ -34,34 +28,6 @@ MessageBus::MessageBase& Addressed(MessageBus::MessageBase& message, const std::
     return message;
 }
 
-// A connection with channel 1 open; throws std::runtime_error when the
-// broker refuses.
-amqp_connection_state_t Open(const BrokerAddress& broker) {
-    amqp_connection_state_t state = amqp_new_connection();
-    amqp_socket_t* socket = amqp_tcp_socket_new(state);
-    if (socket == nullptr || amqp_socket_open(socket, broker.host.c_str(), broker.port) != 0) {
-        amqp_destroy_connection(state);
-        throw std::runtime_error("cannot open a socket to the broker");
-    }
-    try {
-        Check(amqp_login(state, "/", 0, 131072, 0, AMQP_SASL_METHOD_PLAIN, broker.user.c_str(),
-                         broker.password.c_str()),
-              "login");
-        amqp_channel_open(state, 1);
-        Check(amqp_get_rpc_reply(state), "channel.open");
-    } catch (...) {
-        amqp_destroy_connection(state);
-        throw;
-    }
-    return state;
-}
-
-void Close(amqp_connection_state_t state) {
-    amqp_channel_close(state, 1, AMQP_REPLY_SUCCESS);
-    amqp_connection_close(state, AMQP_REPLY_SUCCESS);
-    amqp_destroy_connection(state);
-}
-
 }  // namespace
 
 RawServiceClient::Prepared::Prepared(MessageBus::MessageBase& message, const std::string& replyTo)
@@ -72,21 +38,21 @@ RawServiceClient::Prepared::Prepared(MessageBus::MessageBase& message, const std
 
 RawServiceClient::RawServiceClient(const BrokerAddress& broker, const std::string& exchange,
                                    bool handOff)
-    : state_(Open(broker)), exchange_(exchange), name_(NewClientName()) {
+    : state_(OpenRawConnection(broker)), exchange_(exchange), name_(NewClientName()) {
     try {
         const std::string key = "Veldra." + name_ + ".#";
         amqp_queue_declare(state_, 1, amqp_cstring_bytes(name_.c_str()), 0, 0, 0, 1,
                            amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "queue.declare");
+        CheckRawReply(amqp_get_rpc_reply(state_), "queue.declare");
         amqp_queue_bind(state_, 1, amqp_cstring_bytes(name_.c_str()),
                         amqp_cstring_bytes(exchange.c_str()), amqp_cstring_bytes(key.c_str()),
                         amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "queue.bind");
+        CheckRawReply(amqp_get_rpc_reply(state_), "queue.bind");
         amqp_basic_consume(state_, 1, amqp_cstring_bytes(name_.c_str()), amqp_empty_bytes, 0, 1, 0,
                            amqp_empty_table);
-        Check(amqp_get_rpc_reply(state_), "basic.consume");
+        CheckRawReply(amqp_get_rpc_reply(state_), "basic.consume");
         if (handOff) {
-            publisher_ = Open(broker);
+            publisher_ = OpenRawConnection(broker);
             reader_ = std::thread([this] { ReadReplies(); });
         }
     } catch (...) {
@@ -99,8 +65,8 @@ RawServiceClient::RawServiceClient(const BrokerAddress& broker, const std::strin
 RawServiceClient::~RawServiceClient() {
     stop_ = true;
     if (reader_.joinable()) reader_.join();
-    if (publisher_ != nullptr) Close(publisher_);
-    Close(state_);
+    if (publisher_ != nullptr) CloseRawConnection(publisher_);
+    CloseRawConnection(state_);
 }
 
 std::unique_ptr<RawServiceClient::Prepared> RawServiceClient::Prepare(
@@ -125,7 +91,7 @@ void RawServiceClient::RoundTrip(const Prepared& message) {
     amqp_maybe_release_buffers(state_);
     amqp_envelope_t envelope;
     timeval timeout{kReplyTimeoutSeconds, 0};
-    Check(amqp_consume_message(state_, &envelope, &timeout, 0), "consume");
+    CheckRawReply(amqp_consume_message(state_, &envelope, &timeout, 0), "consume");
     amqp_destroy_envelope(&envelope);
 }
 

@@ -96,15 +96,6 @@ bool ReadStripped(const char* text, std::size_t length, TimeFields& f) {
     return true;
 }
 
-bool FixedDigits(const char* at, int count, int64_t& value) {
-    value = 0;
-    for (int i = 0; i < count; ++i) {
-        if (at[i] < '0' || at[i] > '9') return false;
-        value = value * 10 + (at[i] - '0');
-    }
-    return true;
-}
-
 // Reads the form this library writes, "YYYY-MM-DDTHH:MM:SS", then "." and
 // digits, then "Z", the last two optional, at its fixed places. For such a
 // text the result is what ReadStripped gives; any other text is refused here
@@ -114,9 +105,10 @@ bool ReadWireForm(const char* t, std::size_t length, TimeFields& f) {
         t[16] != ':') {
         return false;
     }
-    if (!FixedDigits(t, 4, f.year) || !FixedDigits(t + 5, 2, f.month) ||
-        !FixedDigits(t + 8, 2, f.day) || !FixedDigits(t + 11, 2, f.hours) ||
-        !FixedDigits(t + 14, 2, f.minutes) || !FixedDigits(t + 17, 2, f.seconds)) {
+    const std::string_view text(t, length);
+    if (!ParseDigits(text, 0, 4, f.year) || !ParseDigits(text, 5, 2, f.month) ||
+        !ParseDigits(text, 8, 2, f.day) || !ParseDigits(text, 11, 2, f.hours) ||
+        !ParseDigits(text, 14, 2, f.minutes) || !ParseDigits(text, 17, 2, f.seconds)) {
         return false;
     }
     std::size_t i = 19;
@@ -124,19 +116,21 @@ bool ReadWireForm(const char* t, std::size_t length, TimeFields& f) {
     if (i < length && t[i] == '.') {
         const std::size_t first = ++i;
         while (i < length && t[i] >= '0' && t[i] <= '9') ++i;
-        const int used = static_cast<int>(std::min<std::size_t>(i - first, 6));
+        const std::size_t used = std::min<std::size_t>(i - first, 6);
         if (used == 0) return false;
-        FixedDigits(t + first, used, f.fraction);
-        for (int n = used; n < 6; ++n) f.fraction *= 10;
+        ParseDigits(text, first, used, f.fraction);
+        for (std::size_t n = used; n < 6; ++n) f.fraction *= 10;
     }
     if (i < length && t[i] == 'Z') ++i;
     return i == length;
 }
 
-bool ParseStripped(const char* text, std::size_t length, Timestamp& result) {
+// The written form first, any other form the calendar's reader takes next.
+bool ParseTimeText(const char* text, std::size_t length, Timestamp& result) {
     TimeFields f;
-    if (!ReadWireForm(text, length, f) && !ReadStripped(text, length, (f = TimeFields()))) {
-        return false;
+    if (!ReadWireForm(text, length, f)) {
+        f = TimeFields();
+        if (!ReadStripped(text, length, f)) return false;
     }
     if (f.year < 1400 || f.year > 9999 || f.month < 1 || f.month > 12 || f.day < 1) return false;
     if (f.day > boost::gregorian::gregorian_calendar::end_of_month_day(
@@ -248,12 +242,12 @@ bool ParseTimestamp(std::string_view text, Timestamp& result) {
         result = Timestamp(boost::posix_time::not_a_date_time);
         return true;
     }
-    return ParseStripped(text.data(), text.size(), result);
+    return ParseTimeText(text.data(), text.size(), result);
 }
 
 bool ParseTimestampZ(const char* text, Timestamp& result) {
     if (text == nullptr) return false;
-    return ParseStripped(text, std::strlen(text), result);
+    return ParseTimeText(text, std::strlen(text), result);
 }
 
 }  // namespace Korvane::Veldra::VeldraMessageLibrary
